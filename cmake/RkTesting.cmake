@@ -1,0 +1,19 @@
+# rk_add_qtest(<name> SOURCES <files...> [LIBS <targets...>] [TIMEOUT <s>])
+# One QtTest program registered with CTest. Tests run under a private HOME and config folder so
+# they never read or write the user's own settings.
+set(RK_TEST_HOME ${CMAKE_BINARY_DIR}/test-home)
+set(RK_LSAN_SUPPRESSIONS ${PROJECT_SOURCE_DIR}/tests/lsan.supp)
+
+function(rk_add_qtest name)
+    cmake_parse_arguments(T "" "TIMEOUT" "SOURCES;LIBS" ${ARGN})
+    if(NOT T_TIMEOUT)
+        set(T_TIMEOUT 300)
+    endif()
+    add_executable(${name} ${T_SOURCES})
+    target_link_libraries(${name} PRIVATE Qt5::Test rkcore ${T_LIBS})
+    target_include_directories(${name} PRIVATE ${PROJECT_SOURCE_DIR}/tests/common)
+    add_test(NAME ${name} COMMAND ${name})
+    set_tests_properties(${name} PROPERTIES
+        TIMEOUT ${T_TIMEOUT}
+        ENVIRONMENT "HOME=${RK_TEST_HOME}/${name};XDG_CONFIG_HOME=${RK_TEST_HOME}/${name}/config;XDG_RUNTIME_DIR=${RK_TEST_HOME}/${name}/run;LIBGL_ALWAYS_SOFTWARE=1;RK_PLUGIN_PATH=${RK_PLUGIN_BUILD_DIR};ASAN_OPTIONS=detect_leaks=1:abort_on_error=0;LSAN_OPTIONS=suppressions=${RK_LSAN_SUPPRESSIONS}:print_suppressions=0;UBSAN_OPTIONS=print_stacktrace=1:halt_on_error=1")
+endfunction()

@@ -1,0 +1,7 @@
+#include "rkscene.h"
+
+RkScene* rkScene = nullptr;
+
+RkScene::RkScene(QObject* parent) : QObject(parent) {}
+
+RkScene::~RkScene() = default;

@@ -1,0 +1,7 @@
+#include "rkundostack.h"
+
+RkUndoStack* rkUndoStack = nullptr;
+
+RkUndoStack::RkUndoStack(QObject* parent) : QObject(parent) {}
+
+RkUndoStack::~RkUndoStack() = default;
