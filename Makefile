@@ -6,6 +6,7 @@ BUILD_TYPE ?= RelWithDebInfo
 JOBS       ?= $(shell nproc)
 XVFB        = xvfb-run -a -s "-screen 0 1600x1200x24"
 GENERATOR   = $(shell command -v ninja >/dev/null 2>&1 && echo "-G Ninja")
+export CCACHE_BASEDIR ?= $(CURDIR)
 
 .PHONY: setup configure build run test asan bench clean
 
