@@ -5,6 +5,7 @@
 #include "rkhelpmgr.h"
 #include "rkplugin.h"
 #include "rkpluginmgr.h"
+#include "rktestfactory.h"
 #include "rktestmain.h"
 
 #include <QMenu>
@@ -49,20 +50,10 @@ class NotAnAction : public QObject {
     Q_OBJECT
 };
 
-template <typename T>
-class Factory : public RkClassFactory {
-public:
-    explicit Factory(const char* guid)
-        : RkClassFactory(&T::staticMetaObject, RkGUID::fromString(QLatin1String(guid)))
-    {
-    }
-    QObject* createInstance() override { return new T; }
-};
-
-Factory<CountingAction> countingFactory("a0000000-0000-0000-0000-000000000001");
-Factory<AlphaAction> alphaFactory("a0000000-0000-0000-0000-000000000002");
-Factory<BetaAction> betaFactory("a0000000-0000-0000-0000-000000000003");
-Factory<NotAnAction> notActionFactory("a0000000-0000-0000-0000-000000000004");
+RkTestFactory<CountingAction> countingFactory("a0000000-0000-0000-0000-000000000001");
+RkTestFactory<AlphaAction> alphaFactory("a0000000-0000-0000-0000-000000000002");
+RkTestFactory<BetaAction> betaFactory("a0000000-0000-0000-0000-000000000003");
+RkTestFactory<NotAnAction> notActionFactory("a0000000-0000-0000-0000-000000000004");
 RkPlugin plugin(QStringLiteral("Actions"), QString(), QString(), 0);
 
 QStringList texts(const QMenu* menu)

@@ -8,6 +8,7 @@
 #include "rkpanesettings.h"
 #include "rkplugin.h"
 #include "rkpluginmgr.h"
+#include "rktestfactory.h"
 #include "rktestmain.h"
 
 #include <QDockWidget>
@@ -66,20 +67,10 @@ public:
     ListPaneAction() : RkPaneAction(QStringLiteral("ListPane")) {}
 };
 
-template <typename T>
-class Factory : public RkClassFactory {
-public:
-    explicit Factory(const char* guid)
-        : RkClassFactory(&T::staticMetaObject, RkGUID::fromString(QLatin1String(guid)))
-    {
-    }
-    QObject* createInstance() override { return new T; }
-};
-
-Factory<ListPane> listFactory("b0000000-0000-0000-0000-000000000001");
-Factory<OtherPane> otherFactory("b0000000-0000-0000-0000-000000000002");
-Factory<ListPaneAction> actionFactory("b0000000-0000-0000-0000-000000000003");
-Factory<ListPaneOption> optionFactory("b0000000-0000-0000-0000-000000000004");
+RkTestFactory<ListPane> listFactory("b0000000-0000-0000-0000-000000000001");
+RkTestFactory<OtherPane> otherFactory("b0000000-0000-0000-0000-000000000002");
+RkTestFactory<ListPaneAction> actionFactory("b0000000-0000-0000-0000-000000000003");
+RkTestFactory<ListPaneOption> optionFactory("b0000000-0000-0000-0000-000000000004");
 RkPlugin plugin(QStringLiteral("Panes"), QString(), QString(), 0);
 
 // Clicks the dock's options button and reads the menu that pops up.
