@@ -176,7 +176,8 @@ void RkUndoStack::cancelHold(int id)
         return;
     const int mark = d->marks.at(level).second;
     d->marks.resize(level);
-    const QVector<Change> undone = d->pending.mid(mark);
+    // Each property goes back once, straight to where it was when the hold opened.
+    const QVector<Change> undone = compress(d->pending.mid(mark));
     d->pending.resize(mark);
     d->apply(undone, true);
 }
