@@ -1,6 +1,8 @@
 #include "rkstoredclasses.h"
 
+#include "rkapp.h"
 #include "rkbone.h"
+#include "rkclassfactory.h"
 #include "rkcamera.h"
 #include "rklight.h"
 #include "rkskeleton.h"
@@ -57,16 +59,35 @@ void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
 
 QString rkStoredClassGuid(const QString& className)
 {
-    return registry().guidByClass.value(className);
+    const QString guid = registry().guidByClass.value(className);
+    if (!guid.isEmpty())
+        return guid;
+    if (RkClassFactory* factory = RkApp::findClassFactory(className))
+        return factory->getGUID().toString();
+    return QString();
 }
 
 RkBase* rkCreateStoredObject(const QString& guid, QString* error)
 {
     const auto it = registry().byGuid.constFind(guid.toLower());
     if (it == registry().byGuid.constEnd()) {
-        if (error)
-            *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
-        return nullptr;
+        // Classes of modules come from their class factories.
+        const RkGUID id = RkGUID::fromString(guid);
+        RkClassFactory* factory = id.isNull() ? nullptr : RkApp::findClassFactory(id);
+        if (!factory) {
+            if (error)
+                *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
+            return nullptr;
+        }
+        QObject* made = factory->createInstance();
+        auto* object = qobject_cast<RkBase*>(made);
+        if (!object) {
+            delete made;
+            if (error)
+                *error = QStringLiteral("%1 (GUID %2) is not a class that a scene can store")
+                             .arg(factory->className(), guid);
+        }
+        return object;
     }
     RkBase* object = it->create();
     if (!object && error)
