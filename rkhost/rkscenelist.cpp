@@ -101,13 +101,13 @@ void RkSceneList::rebuild()
             return done;
         RkNode* parent = node->getNodeParent();
         QTreeWidgetItem* item = parent && rkScene->contains(parent)
-            ? new QTreeWidgetItem(itemFor(parent))
-            : new QTreeWidgetItem(this);
+                                    ? new QTreeWidgetItem(itemFor(parent))
+                                    : new QTreeWidgetItem(this);
         item->setText(0, node->getLabel());
         m_nodes.insert(item, node);
         items.insert(node, item);
         connect(node, &RkElement::labelChanged, this, &RkSceneList::scheduleRebuild,
-            Qt::UniqueConnection);
+                Qt::UniqueConnection);
         return item;
     };
     for (RkNode* node : nodes)

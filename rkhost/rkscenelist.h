@@ -10,7 +10,8 @@ class RkNode;
 // The scene's nodes as a tree (figures with their bones). Clicking a node selects it, Ctrl+click
 // adds it to the selection; the highlighted items follow the scene's selection however it
 // changes.
-class RkSceneList : public QTreeWidget {
+class RkSceneList : public QTreeWidget
+{
     Q_OBJECT
 public:
     explicit RkSceneList(QWidget* parent = nullptr);

@@ -11,7 +11,8 @@
 #include <QMenu>
 #include <QMessageBox>
 
-namespace {
+namespace
+{
 const char* const FileFilter = QT_TRANSLATE_NOOP("RkSceneMenus", "Scenes (*.rks);;All files (*)");
 }
 
@@ -37,8 +38,10 @@ RkSceneMenus::RkSceneMenus(RkMainWindow* window) : QObject(window), d(std::make_
     file->addSeparator();
 
     QMenu* edit = window->addMenu(QStringLiteral("&Edit"));
-    d->undoAction = edit->addAction(tr("&Undo"), rkUndoStack, &RkUndoStack::undo, QKeySequence::Undo);
-    d->redoAction = edit->addAction(tr("&Redo"), rkUndoStack, &RkUndoStack::redo, QKeySequence::Redo);
+    d->undoAction =
+        edit->addAction(tr("&Undo"), rkUndoStack, &RkUndoStack::undo, QKeySequence::Undo);
+    d->redoAction =
+        edit->addAction(tr("&Redo"), rkUndoStack, &RkUndoStack::redo, QKeySequence::Redo);
     d->undoAction->setObjectName(QStringLiteral("UndoAction"));
     d->redoAction->setObjectName(QStringLiteral("RedoAction"));
 
@@ -53,12 +56,30 @@ RkSceneMenus::RkSceneMenus(RkMainWindow* window) : QObject(window), d(std::make_
 
 RkSceneMenus::~RkSceneMenus() = default;
 
-QAction* RkSceneMenus::newAction() const { return d->newAction; }
-QAction* RkSceneMenus::openAction() const { return d->openAction; }
-QAction* RkSceneMenus::saveAction() const { return d->saveAction; }
-QAction* RkSceneMenus::saveAsAction() const { return d->saveAsAction; }
-QAction* RkSceneMenus::undoAction() const { return d->undoAction; }
-QAction* RkSceneMenus::redoAction() const { return d->redoAction; }
+QAction* RkSceneMenus::newAction() const
+{
+    return d->newAction;
+}
+QAction* RkSceneMenus::openAction() const
+{
+    return d->openAction;
+}
+QAction* RkSceneMenus::saveAction() const
+{
+    return d->saveAction;
+}
+QAction* RkSceneMenus::saveAsAction() const
+{
+    return d->saveAsAction;
+}
+QAction* RkSceneMenus::undoAction() const
+{
+    return d->undoAction;
+}
+QAction* RkSceneMenus::redoAction() const
+{
+    return d->redoAction;
+}
 
 void RkSceneMenus::newScene()
 {
@@ -68,8 +89,8 @@ void RkSceneMenus::newScene()
 
 void RkSceneMenus::open()
 {
-    const QString path = QFileDialog::getOpenFileName(d->window, tr("Open Scene"),
-        QFileInfo(rkScene->getFileName()).path(), tr(FileFilter));
+    const QString path = QFileDialog::getOpenFileName(
+        d->window, tr("Open Scene"), QFileInfo(rkScene->getFileName()).path(), tr(FileFilter));
     if (!path.isEmpty())
         openScene(path);
 }
@@ -85,7 +106,7 @@ void RkSceneMenus::save()
 void RkSceneMenus::saveAs()
 {
     QString path = QFileDialog::getSaveFileName(d->window, tr("Save Scene As"),
-        rkScene->getFileName(), tr(FileFilter));
+                                                rkScene->getFileName(), tr(FileFilter));
     if (path.isEmpty())
         return;
     if (QFileInfo(path).suffix().isEmpty())
@@ -99,8 +120,8 @@ bool RkSceneMenus::openScene(const QString& path)
     if (rkScene->load(path, &error))
         return true;
     tellUser(tr("Open Scene"),
-        tr("The scene \"%1\" could not be opened: %2.\nThe scene you had is unchanged.")
-            .arg(QFileInfo(path).fileName(), error));
+             tr("The scene \"%1\" could not be opened: %2.\nThe scene you had is unchanged.")
+                 .arg(QFileInfo(path).fileName(), error));
     return false;
 }
 
@@ -109,7 +130,8 @@ bool RkSceneMenus::saveScene(const QString& path)
     QString error;
     if (rkScene->save(path, &error))
         return true;
-    tellUser(tr("Save Scene"),
+    tellUser(
+        tr("Save Scene"),
         tr("The scene could not be saved as \"%1\": %2.").arg(QFileInfo(path).fileName(), error));
     return false;
 }
@@ -130,9 +152,9 @@ void RkSceneMenus::updateUndoRedo()
 void RkSceneMenus::updateTitle()
 {
     const QString file = rkScene->getFileName();
-    d->window->setWindowTitle(file.isEmpty() ? QStringLiteral("rkhost")
-                                             : QStringLiteral("%1 - rkhost")
-                                                   .arg(QFileInfo(file).fileName()));
+    d->window->setWindowTitle(file.isEmpty()
+                                  ? QStringLiteral("rkhost")
+                                  : QStringLiteral("%1 - rkhost").arg(QFileInfo(file).fileName()));
 }
 
 void RkSceneMenus::tellUser(const QString& title, const QString& message)

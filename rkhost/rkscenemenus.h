@@ -10,7 +10,8 @@ class RkMainWindow;
 // The host's File menu (New, Open, Save, Save As) and Edit menu (Undo and Redo, named after
 // what they take back or do again). A file that cannot be opened leaves the scene as it was and
 // the user is told why in a message box.
-class RkSceneMenus : public QObject {
+class RkSceneMenus : public QObject
+{
     Q_OBJECT
 public:
     explicit RkSceneMenus(RkMainWindow* window);

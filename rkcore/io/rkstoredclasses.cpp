@@ -2,14 +2,15 @@
 
 #include "rkapp.h"
 #include "rkbone.h"
-#include "rkclassfactory.h"
 #include "rkcamera.h"
+#include "rkclassfactory.h"
 #include "rklight.h"
 #include "rkskeleton.h"
 
 #include <QHash>
 
-namespace {
+namespace
+{
 
 struct StoredClass {
     QString guid;
@@ -33,15 +34,15 @@ Registry& registry()
     static Registry r = [] {
         Registry core;
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a01"), &RkNode::staticMetaObject,
-            [] { return new RkNode; });
+                 [] { return new RkNode; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a02"),
-            &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
+                 &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a03"), &RkBone::staticMetaObject,
-            [] { return new RkBone; });
+                 [] { return new RkBone; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a04"),
-            &RkCamera::staticMetaObject, [] { return new RkCamera; });
+                 &RkCamera::staticMetaObject, [] { return new RkCamera; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a05"), &RkLight::staticMetaObject,
-            [] { return new RkLight; });
+                 [] { return new RkLight; });
         return core;
     }();
     return r;
@@ -50,7 +51,7 @@ Registry& registry()
 } // namespace
 
 void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
-    std::function<RkBase*()> create)
+                           std::function<RkBase*()> create)
 {
     if (guid.isEmpty() || !metaObject || !create)
         return;

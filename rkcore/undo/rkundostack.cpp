@@ -7,7 +7,8 @@
 
 RkUndoStack* rkUndoStack = nullptr;
 
-namespace {
+namespace
+{
 
 struct Change {
     QPointer<RkProperty> property;
@@ -29,14 +30,14 @@ QVector<Change> compress(const QVector<Change>& changes)
         if (!c.property)
             continue;
         auto it = std::find_if(out.begin(), out.end(),
-            [&](const Change& o) { return o.property == c.property; });
+                               [&](const Change& o) { return o.property == c.property; });
         if (it == out.end())
             out.append(c);
         else
             it->after = c.after;
     }
-    out.erase(std::remove_if(out.begin(), out.end(),
-                  [](const Change& c) { return c.before == c.after; }),
+    out.erase(
+        std::remove_if(out.begin(), out.end(), [](const Change& c) { return c.before == c.after; }),
         out.end());
     return out;
 }
@@ -116,7 +117,7 @@ int RkUndoStack::index() const
 }
 
 void RkUndoStack::recordPropertyChange(RkProperty* property, const QVariant& oldValue,
-    const QVariant& newValue)
+                                       const QVariant& newValue)
 {
     if (d->applying || d->marks.isEmpty() || !property)
         return;
@@ -216,7 +217,7 @@ void RkUndoStack::clear()
 }
 
 void RkUndoStack::notifyCaptions(const QString& oldUndo, const QString& oldRedo, bool oldCanUndo,
-    bool oldCanRedo)
+                                 bool oldCanRedo)
 {
     if (oldUndo != getUndoCaption() || oldCanUndo != canUndo())
         Q_EMIT undoCaptionChanged(getUndoCaption());

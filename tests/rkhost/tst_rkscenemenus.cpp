@@ -6,15 +6,16 @@
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
 #include "rkskeleton.h"
+#include "rktestmain.h"
 #include "rkundostack.h"
 #include "rkundostackhold.h"
-#include "rktestmain.h"
 
 #include <QAction>
 #include <QMessageBox>
 #include <QTemporaryDir>
 
-class TestRkSceneMenus : public QObject {
+class TestRkSceneMenus : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void init();
@@ -52,8 +53,8 @@ void TestRkSceneMenus::cleanup()
 
 void TestRkSceneMenus::undoRedoCarryTheirCaptions()
 {
-    auto* smile = qobject_cast<RkFloatProperty*>(
-        rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    auto* smile =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
     QCOMPARE(menus->undoAction()->text(), QStringLiteral("&Undo"));
     QVERIFY(!menus->undoAction()->isEnabled());
     {
@@ -86,17 +87,16 @@ void TestRkSceneMenus::badFileKeepsTheSceneAndSaysWhy()
     QVERIFY(box);
     QTRY_VERIFY(box->isVisible());
     QVERIFY2(box->text().contains("broken.rks") && box->text().contains("unchanged"),
-        qPrintable(box->text()));
-    QVERIFY2(box->text().contains("format version"),
-        qPrintable(box->text()));
+             qPrintable(box->text()));
+    QVERIFY2(box->text().contains("format version"), qPrintable(box->text()));
     box->close();
 }
 
 void TestRkSceneMenus::saveThenOpenBringsTheSceneBack()
 {
     const QString path = dir.filePath("kept.rks");
-    auto* smile = qobject_cast<RkFloatProperty*>(
-        rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    auto* smile =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
     smile->setValue(0.4f);
     QVERIFY(menus->saveScene(path));
     QCOMPARE(window->windowTitle(), QStringLiteral("kept.rks - rkhost"));
@@ -105,8 +105,8 @@ void TestRkSceneMenus::saveThenOpenBringsTheSceneBack()
     QCOMPARE(list->topLevelItemCount(), 0);
     QCOMPARE(window->windowTitle(), QStringLiteral("rkhost"));
     QVERIFY(menus->openScene(path));
-    auto* loaded = qobject_cast<RkFloatProperty*>(
-        rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    auto* loaded =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
     QCOMPARE(loaded->getValue(), 0.4f);
     // The list shows the loaded scene: figure, prop, camera and light at the top.
     QCOMPARE(list->topLevelItemCount(), 4);
@@ -120,11 +120,11 @@ void TestRkSceneMenus::sceneListSelects()
     QTreeWidgetItem* cameraItem = list->itemForNode(camera);
     QVERIFY(cameraItem);
     QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
-        list->visualItemRect(cameraItem).center());
+                      list->visualItemRect(cameraItem).center());
     QCOMPARE(rkScene->getPrimarySelection(), camera);
 
     QTest::mouseClick(list->viewport(), Qt::LeftButton, Qt::ControlModifier,
-        list->visualItemRect(list->itemForNode(prop)).center());
+                      list->visualItemRect(list->itemForNode(prop)).center());
     QCOMPARE(rkScene->getSelectedNodes(), RkNodeList({camera, prop}));
     QVERIFY(list->itemForNode(prop)->font(0).bold());
     QVERIFY(!cameraItem->font(0).bold());

@@ -21,7 +21,8 @@
 
 #include <functional>
 
-namespace {
+namespace
+{
 
 int livingParts = 0;
 int livingData = 0;
@@ -36,7 +37,8 @@ template <typename T> T* assertCast(RkBase* object)
 }
 
 // A stored object owned by TestData: a number and a pointer to a morph.
-class TestPart : public RkBase {
+class TestPart : public RkBase
+{
     Q_OBJECT
 public:
     TestPart() { ++livingParts; }
@@ -65,7 +67,8 @@ public:
 };
 
 // Element data holding owned parts, a pointer to another node, a note and raw bytes.
-class TestData : public RkElementData {
+class TestData : public RkElementData
+{
     Q_OBJECT
 public:
     TestData() : RkElementData(QStringLiteral("TestData"), true) { ++livingData; }
@@ -131,7 +134,7 @@ QString sceneText()
     for (RkNode* n : rkScene->getNodes()) {
         out << QStringLiteral("%1 %2 \"%3\" parent=%4 source=%5 origin=%6,%7,%8")
                    .arg(n->className(), n->getName(), n->getLabel(),
-                       n->getNodeParent() ? n->getNodeParent()->getName() : "-", n->getSource())
+                        n->getNodeParent() ? n->getNodeParent()->getName() : "-", n->getSource())
                    .arg(n->getOrigin().x())
                    .arg(n->getOrigin().y())
                    .arg(n->getOrigin().z());
@@ -145,13 +148,13 @@ QString sceneText()
             auto* data = qobject_cast<TestData*>(item);
             QStringList parts;
             for (TestPart* part : data ? data->parts : QVector<TestPart*>())
-                parts << QStringLiteral("%1->%2").arg(part->number).arg(
-                    part->morph ? part->morph->getName() : "null");
+                parts << QStringLiteral("%1->%2")
+                             .arg(part->number)
+                             .arg(part->morph ? part->morph->getName() : "null");
             out << QStringLiteral("  data %1 buddy=%2 note=%3 blob=%4 parts=%5")
-                       .arg(item->getName(),
-                           data && data->buddy ? data->buddy->getName() : "null",
-                           data ? data->note : "", data ? QString(data->blob.toHex()) : "",
-                           parts.join(","));
+                       .arg(item->getName(), data && data->buddy ? data->buddy->getName() : "null",
+                            data ? data->note : "", data ? QString(data->blob.toHex()) : "",
+                            parts.join(","));
         }
     }
     return out.join('\n');
@@ -261,7 +264,8 @@ struct FileBuilder {
 
 } // namespace
 
-class TestRkSceneFile : public QObject {
+class TestRkSceneFile : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -348,9 +352,9 @@ void TestRkSceneFile::roundTripKeepsEverything()
     QStringList events;
     QObject guard;
     for (auto [signal, name] : {std::make_pair(&RkScene::sceneClearStarting, "clearStarting"),
-             std::make_pair(&RkScene::sceneCleared, "cleared"),
-             std::make_pair(&RkScene::sceneLoadStarting, "loadStarting"),
-             std::make_pair(&RkScene::sceneLoaded, "loaded")}) {
+                                std::make_pair(&RkScene::sceneCleared, "cleared"),
+                                std::make_pair(&RkScene::sceneLoadStarting, "loadStarting"),
+                                std::make_pair(&RkScene::sceneLoaded, "loaded")}) {
         const QString n = name;
         connect(rkScene, signal, &guard, [&events, n] { events << n; });
     }
@@ -407,7 +411,8 @@ void TestRkSceneFile::badInputLeavesTheSceneAlone_data()
         qToLittleEndian<quint32>(7, f.data() + 8);
         QTest::newRow("newer format") << f << "format version 7";
         QTest::newRow("truncated") << b.bytes().left(b.bytes().size() - 3) << "truncated";
-        QTest::newRow("trailing bytes") << b.bytes() + "zz" << "after its end";
+        QTest::newRow("trailing bytes") << b.bytes() + "zz"
+                                        << "after its end";
         QByteArray flipped = b.bytes();
         flipped[30] = char(flipped[30] ^ 0x20);
         QTest::newRow("damaged") << flipped << "checksum";
@@ -427,14 +432,14 @@ void TestRkSceneFile::badInputLeavesTheSceneAlone_data()
         QTest::newRow("wrong value type") << b.bytes() << "holds an int where a string belongs";
         b.objects.last().sections = {{0x7777, QByteArray()}};
         QTest::newRow("unknown section") << b.bytes() << "does not know section 0x7777";
-        b.objects.last().sections = {{0x0101, FileBuilder::stringValue("label")
-                                                  + FileBuilder::stringValue("")
-                                                  + FileBuilder::floatValue(qQNaN())}};
+        b.objects.last().sections = {{0x0101, FileBuilder::stringValue("label") +
+                                                  FileBuilder::stringValue("") +
+                                                  FileBuilder::floatValue(qQNaN())}};
         QTest::newRow("NaN value") << b.bytes() << "not a number";
     }
-    QTest::newRow("missing index") << withData({{0x300, FileBuilder::pointer(1, 9)}}, itemPointer)
-                                         .bytes()
-                                   << "refers to object 9";
+    QTest::newRow("missing index")
+        << withData({{0x300, FileBuilder::pointer(1, 9)}}, itemPointer).bytes()
+        << "refers to object 9";
     QTest::newRow("wrong class")
         << withData({{0x300, FileBuilder::pointer(1, 0)}}, itemPointer).bytes()
         << "Failure to cast RkAssertCast";
@@ -445,8 +450,8 @@ void TestRkSceneFile::badInputLeavesTheSceneAlone_data()
         QTest::newRow("missing property") << b.bytes() << "does not have";
     }
     {
-        FileBuilder b = withData(
-            {{0x300, FileBuilder::pointer(1, 2) + FileBuilder::pointer(1, 2)}}, itemPointer);
+        FileBuilder b = withData({{0x300, FileBuilder::pointer(1, 2) + FileBuilder::pointer(1, 2)}},
+                                 itemPointer);
         b.add(PartGuid, "TestPart", "").sections = {
             {0x301, FileBuilder::intValue(1) + FileBuilder::pointer(0, -1)}};
         QTest::newRow("pointed at twice") << b.bytes() << "more than once";
@@ -557,7 +562,8 @@ void TestRkSceneFile::saveReplacesTheFileWhole()
 
     // An object of a class with no factory cannot be stored: the save fails and the old file
     // stays as it was.
-    class Unstorable : public RkElementData {
+    class Unstorable : public RkElementData
+    {
     public:
         Unstorable() : RkElementData("Unstorable", true) {}
     };

@@ -7,7 +7,8 @@
 
 #include <QSignalSpy>
 
-namespace {
+namespace
+{
 
 // The tree as "path: labels" lines, walked the way panes walk it: first child, next sibling.
 void dump(RkPropertyGroup* group, QStringList& out)
@@ -37,7 +38,8 @@ RkFloatProperty* addFloat(RkElement& e, const QString& name, const QString& path
 
 } // namespace
 
-class TestRkPropertyGroupTree : public QObject {
+class TestRkPropertyGroupTree : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void groupsFollowPaths();
@@ -55,8 +57,8 @@ void TestRkPropertyGroupTree::groupsFollowPaths()
     addFloat(e, "bend", "Deformers");
     RkFloatProperty* frown = addFloat(e, "frown", "Morphs/Head/Face");
     QCOMPARE(dump(e.getPropertyGroups()),
-        QStringList({"Morphs: ", "Morphs/Head: ", "Morphs/Head/Face: SMILE,FROWN",
-            "Morphs/Head/Ears: EARS", "Morphs/Body: BODY", "Deformers: BEND"}));
+             QStringList({"Morphs: ", "Morphs/Head: ", "Morphs/Head/Face: SMILE,FROWN",
+                          "Morphs/Head/Ears: EARS", "Morphs/Body: BODY", "Deformers: BEND"}));
     QCOMPARE(frown->getPath(), QStringLiteral("Morphs/Head/Face"));
     QCOMPARE(frown->getElement(), &e);
     QCOMPARE(treeChanged.count(), 5);
@@ -85,7 +87,7 @@ void TestRkPropertyGroupTree::propertiesLeaveTheirGroups()
     // Moving the only property of a branch takes the emptied groups away.
     e.getPropertyGroups()->addProperty(ears, "Morphs/Body");
     QCOMPARE(dump(e.getPropertyGroups()),
-        QStringList({"Morphs: ", "Morphs/Body: BODY,EARS", "Deformers: BEND"}));
+             QStringList({"Morphs: ", "Morphs/Body: BODY,EARS", "Deformers: BEND"}));
     QCOMPARE(ears->getPath(), QStringLiteral("Morphs/Body"));
 
     delete bend; // deleted from outside: the element and the tree both let go

@@ -10,7 +10,8 @@
 
 #include <QSignalSpy>
 
-namespace {
+namespace
+{
 
 RkNode* makeNode(const QString& name)
 {
@@ -36,7 +37,8 @@ const void* nodeArg(const QList<QVariant>& args)
 
 } // namespace
 
-class TestRkScene : public QObject {
+class TestRkScene : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void init() { rkScene->clear(); }
@@ -131,12 +133,12 @@ void TestRkScene::clearEmitsInOrder()
     connect(rkScene, &RkScene::sceneClearStarting, &guard, [&] { events << "clearStarting"; });
     connect(rkScene, &RkScene::primarySelectionChanged, &guard, [&] { events << "primary"; });
     connect(rkScene, &RkScene::nodeRemoved, &guard,
-        [&](RkNode* n) { events << "removed " + n->getName(); });
+            [&](RkNode* n) { events << "removed " + n->getName(); });
     connect(a, &QObject::destroyed, &guard, [&] { events << "destroyed a"; });
     connect(rkScene, &RkScene::sceneCleared, &guard, [&] { events << "cleared"; });
     rkScene->clear();
     QCOMPARE(events, QStringList({"clearStarting", "primary", "removed b", "removed a",
-                         "destroyed a", "cleared"}));
+                                  "destroyed a", "cleared"}));
 }
 
 void TestRkScene::bonesAndFigures()
@@ -200,8 +202,8 @@ void TestRkScene::demoContent()
         QCOMPARE(b->getSkeleton(), figure);
         QVERIFY(b->getPropertyGroups()->findChild("Transforms/Rotation"));
     }
-    for (const char* required : {"hip", "abdomen", "chest", "neck", "head", "lShldr", "rShldr",
-             "lThigh", "rThigh"})
+    for (const char* required :
+         {"hip", "abdomen", "chest", "neck", "head", "lShldr", "rShldr", "lThigh", "rThigh"})
         QVERIFY2(boneNames.contains(required), required);
     QVERIFY(figure->findBone("neck")->findProperty("XTranslate")->isHidden());
 
@@ -219,15 +221,15 @@ void TestRkScene::demoContent()
     }
     QVERIFY(morphs >= 24);
     for (const char* path : {"Morphs/Head/Face", "Morphs/Head/Ears", "Morphs/Body",
-             "Morphs/Body/Arms", "General", "Deformers"})
+                             "Morphs/Body/Arms", "General", "Deformers"})
         QVERIFY2(tree->findChild(path), path);
     QCOMPARE(tree->findChild("Morphs/Head/Face")->getPath(), QStringLiteral("Morphs/Head/Face"));
     bool floatless = false;
     for (RkPropertyGroup* g : tree->getTopGroups()) {
         const auto props = g->getProperties();
-        floatless |= !props.isEmpty() && g->getChildren().isEmpty()
-            && std::none_of(props.begin(), props.end(),
-                [](RkProperty* p) { return qobject_cast<RkFloatProperty*>(p); });
+        floatless |= !props.isEmpty() && g->getChildren().isEmpty() &&
+                     std::none_of(props.begin(), props.end(),
+                                  [](RkProperty* p) { return qobject_cast<RkFloatProperty*>(p); });
     }
     QVERIFY(floatless);
 

@@ -3,15 +3,16 @@
 #include "rkfloatproperty.h"
 #include "rkintproperty.h"
 #include "rkscene.h"
+#include "rktestmain.h"
 #include "rkundostack.h"
 #include "rkundostackhold.h"
-#include "rktestmain.h"
 
 #include <QSignalSpy>
 
 #include <limits>
 
-class TestRkUndoStack : public QObject {
+class TestRkUndoStack : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void init();
