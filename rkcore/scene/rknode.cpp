@@ -117,6 +117,13 @@ bool RkNode::setNodeParent(RkNode* parent)
         if (up == this)
             return false;
     }
+    linkParent(parent);
+    emitTransformChanged();
+    return true;
+}
+
+void RkNode::linkParent(RkNode* parent)
+{
     if (d->parent) {
         d->parent->d->children.removeAll(this);
         Q_EMIT d->parent->nodeChildrenChanged();
@@ -127,8 +134,6 @@ bool RkNode::setNodeParent(RkNode* parent)
         parent->d->children.append(this);
         Q_EMIT parent->nodeChildrenChanged();
     }
-    emitTransformChanged();
-    return true;
 }
 
 QList<RkNode*> RkNode::getNodeChildren() const
@@ -236,9 +241,13 @@ void RkNode::setSource(const QString& source)
 
 void RkNode::emitTransformChanged()
 {
-    Q_EMIT transformChanged();
-    for (RkNode* child : qAsConst(d->children))
-        child->emitTransformChanged();
+    // Without recursion: a hierarchy may be deep.
+    QList<RkNode*> pending{this};
+    while (!pending.isEmpty()) {
+        RkNode* node = pending.takeLast();
+        Q_EMIT node->transformChanged();
+        pending += node->d->children;
+    }
 }
 
 void RkNode::save(RkOutFile* file) const
@@ -340,8 +349,17 @@ void RkNode::setPointer(const RkInFile* file, short sectionId, short index, RkBa
         if (!parent)
             throw QStringLiteral("the parent of node \"%1\" is a %2, not a node")
                 .arg(getName(), object->className());
-        if (!setNodeParent(parent))
-            throw QStringLiteral("node \"%1\" would be its own parent").arg(getName());
+        // Nothing watches a node being loaded, so it is linked without signals; a loop or a
+        // hierarchy deeper than any rig fails the load.
+        int levels = 0;
+        for (RkNode* up = parent; up; up = up->getNodeParent()) {
+            if (up == this)
+                throw QStringLiteral("node \"%1\" would be its own parent").arg(getName());
+            if (++levels >= MaxHierarchyDepth)
+                throw QStringLiteral("the node hierarchy is deeper than %1 levels")
+                    .arg(MaxHierarchyDepth);
+        }
+        linkParent(parent);
         return;
     }
     if (sectionId == SectionDataItems) {
