@@ -6,7 +6,7 @@
 #include <QScriptEngine>
 #include <QString>
 
-class QMetaObject;
+struct QMetaObject;
 class QObject;
 class QScriptContext;
 class QScriptValue;

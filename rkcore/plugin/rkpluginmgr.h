@@ -7,7 +7,7 @@
 
 #include <memory>
 
-class QMetaObject;
+struct QMetaObject;
 class QScriptEngine;
 class RkClassFactory;
 class RkGUID;
