@@ -1,8 +1,11 @@
 #include "rkstoredclasses.h"
 
+#include "rkapp.h"
 #include "rkbone.h"
 #include "rkcamera.h"
+#include "rkclassfactory.h"
 #include "rklight.h"
+#include "rkpluginmgr.h"
 #include "rkskeleton.h"
 
 #include <QHash>
@@ -45,6 +48,18 @@ Registry& registry()
     return r;
 }
 
+// The class factory a module registered for a stored class, found by class name or GUID.
+RkClassFactory* moduleFactory(const QString& className, const QString& guid)
+{
+    RkPluginMgr* plugins = rkApp ? rkApp->getPluginMgr() : nullptr;
+    if (!plugins)
+        return nullptr;
+    RkClassFactory* factory = className.isEmpty()
+                                  ? plugins->findClassFactory(RkGUID::fromString(guid))
+                                  : plugins->findClassFactory(className);
+    return factory && factory->inherits(&RkBase::staticMetaObject) ? factory : nullptr;
+}
+
 } // namespace
 
 void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
@@ -57,13 +72,27 @@ void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
 
 QString rkStoredClassGuid(const QString& className)
 {
-    return registry().guidByClass.value(className);
+    const QString guid = registry().guidByClass.value(className);
+    if (!guid.isEmpty())
+        return guid;
+    RkClassFactory* factory = moduleFactory(className, QString());
+    return factory ? factory->getGUID().toString() : QString();
 }
 
 RkBase* rkCreateStoredObject(const QString& guid, QString* error)
 {
     const auto it = registry().byGuid.constFind(guid.toLower());
     if (it == registry().byGuid.constEnd()) {
+        if (RkClassFactory* factory = moduleFactory(QString(), guid)) {
+            QObject* made = factory->createInstance();
+            if (auto* object = qobject_cast<RkBase*>(made))
+                return object;
+            delete made;
+            if (error)
+                *error = QStringLiteral("the class factory of %1 made nothing")
+                             .arg(factory->className());
+            return nullptr;
+        }
         if (error)
             *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
         return nullptr;

@@ -4,9 +4,14 @@
 #include "rkezmixers.h"
 #include "rkezmixersolver.h"
 
+#include "rkapp.h"
+#include "rkcomponentsplugin.h"
 #include "rkfloatproperty.h"
+#include "rkoutfile.h"
+#include "rkpluginmgr.h"
 #include "rkscene.h"
 #include "rkskeleton.h"
+#include "rkstoredclasses.h"
 #include "rktestmain.h"
 #include "rkundostack.h"
 
@@ -98,6 +103,48 @@ QString toString(const QVector<float>& values)
     return list.join(QStringLiteral(", "));
 }
 
+// Stand-ins that store one pointer list under a mixer section id but point at objects of the
+// wrong class. They are stored under GUIDs that load back as the real mixer classes, which then
+// meet the wrong objects.
+class OuterImpostor : public RkElementData {
+    Q_OBJECT
+public:
+    OuterImpostor(short section, RkBase* target)
+        : RkElementData(QStringLiteral("RkEzMixers")), m_section(section), m_target(target)
+    {
+        target->setParent(this);
+    }
+    void save(RkOutFile* file) const override
+    {
+        file->startSection(m_section);
+        file->writePointer(m_target, 0);
+        file->endSection();
+    }
+
+private:
+    short m_section;
+    RkBase* m_target;
+};
+
+class InnerImpostor : public RkBase {
+    Q_OBJECT
+public:
+    InnerImpostor(short section, RkBase* target) : m_section(section), m_target(target)
+    {
+        target->setParent(this);
+    }
+    void save(RkOutFile* file) const override
+    {
+        file->startSection(m_section);
+        file->writePointer(m_target, 0);
+        file->endSection();
+    }
+
+private:
+    short m_section;
+    RkBase* m_target;
+};
+
 const QVector<QPoint> kSlots = {{105, 42}, {168, 127}, {105, 212}, {42, 127},
                                 {149, 66}, {149, 187}, {60, 187},  {60, 66}};
 
@@ -106,6 +153,7 @@ const QVector<QPoint> kSlots = {{105, 42}, {168, 127}, {105, 212}, {42, 127},
 class TestRkEzMixer : public QObject {
     Q_OBJECT
 private Q_SLOTS:
+    void initTestCase();
     void cleanup();
     void drive_data();
     void drive();
@@ -114,7 +162,15 @@ private Q_SLOTS:
     void deletedPropertyIsSkipped();
     void removalTakesOutAtOnceAndDeletesLater();
     void saveClearLoadRoundTrip();
+    void wrongClassFailsLoad_data();
+    void wrongClassFailsLoad();
 };
+
+// The host makes stored mixers through the module's class factories.
+void TestRkEzMixer::initTestCase()
+{
+    QVERIFY(rkApp->getPluginMgr()->addPlugin(rkComponentsPlugin()));
+}
 
 void TestRkEzMixer::cleanup()
 {
@@ -374,6 +430,55 @@ void TestRkEzMixer::saveClearLoadRoundTrip()
     QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Shape Mixing"));
     rkUndoStack->undo();
     QCOMPARE(morphValues(loaded, 8, 3), before);
+}
+
+void TestRkEzMixer::wrongClassFailsLoad_data()
+{
+    QTest::addColumn<int>("row");
+    QTest::newRow("a control in the mixer list") << 0;
+    QTest::newRow("a driver in a control list") << 1;
+    QTest::newRow("a control as the driver") << 2;
+}
+
+void TestRkEzMixer::wrongClassFailsLoad()
+{
+    QFETCH(int, row);
+
+    // Whatever an impostor is stored as loads back as a real mixer list or mixer.
+    rkRegisterStoredClass(QString("6a0f3c2e-0000-4000-8000-00000000000%1").arg(row),
+                          &OuterImpostor::staticMetaObject, [] { return new RkEzMixers; });
+    rkRegisterStoredClass(QString("6a0f3c2e-0000-4000-8000-00000000001%1").arg(row),
+                          &InnerImpostor::staticMetaObject, [] { return new RkEzMixer; });
+    RkSkeleton* figure = makeFigure(1);
+    if (row == 0)
+        figure->addDataItem(new OuterImpostor(0x210, new RkEzMixerControl));
+    else if (row == 1)
+        figure->addDataItem(
+            new OuterImpostor(0x210, new InnerImpostor(0x220, new RkEzMixerDriver)));
+    else
+        figure->addDataItem(
+            new OuterImpostor(0x210, new InnerImpostor(0x230, new RkEzMixerControl)));
+    rkScene->addNode(figure);
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("impostor.rks"));
+    QString error;
+    QVERIFY2(rkScene->save(path, &error), qPrintable(error));
+    rkScene->clear();
+
+    // The scene the user has open keeps everything when the load fails.
+    RkSkeleton* kept = makeFigure(2);
+    kept->setName(QStringLiteral("Kept"));
+    auto* keptMixers = new RkEzMixers;
+    keptMixers->addMixer(makeMixer(kept, kSlots.mid(0, 2), {1.f, 1.f}));
+    kept->addDataItem(keptMixers);
+    rkScene->addNode(kept);
+
+    QVERIFY(!rkScene->load(path, &error));
+    QVERIFY2(error.contains(QStringLiteral("Failure to cast RkAssertCast")), qPrintable(error));
+    QCOMPARE(rkScene->getNodes(), RkNodeList{kept});
+    QCOMPARE(kept->findDataItem(QStringLiteral("RkEzMixers")), keptMixers);
+    QCOMPARE(keptMixers->getMixers().size(), 1);
+    QCOMPARE(keptMixers->getMixers()[0]->getControls().size(), 2);
 }
 
 RK_TEST_MAIN(TestRkEzMixer)
