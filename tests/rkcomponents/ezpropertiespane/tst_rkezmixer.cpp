@@ -5,9 +5,11 @@
 #include "rkezmixersolver.h"
 
 #include "rkapp.h"
+#include "rkclassfactory.h"
 #include "rkcomponentsplugin.h"
 #include "rkfloatproperty.h"
 #include "rkoutfile.h"
+#include "rkplugin.h"
 #include "rkpluginmgr.h"
 #include "rkscene.h"
 #include "rkskeleton.h"
@@ -155,6 +157,7 @@ class TestRkEzMixer : public QObject {
 private Q_SLOTS:
     void initTestCase();
     void cleanup();
+    void factories();
     void drive_data();
     void drive();
     void controlsOnOnePointLeaveValues();
@@ -177,6 +180,44 @@ void TestRkEzMixer::cleanup()
     rkScene->clear();
     rkUndoStack->clear();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+}
+
+// Stored scenes name these classes by GUID, so the GUIDs, the classes they make and their order
+// in the module's table must hold.
+void TestRkEzMixer::factories()
+{
+    const QList<QPair<QString, QString>> expected = {
+        {"RkEzMixers", "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b"},
+        {"RkEzMixer", "19054e20-bdb2-11de-a0a6-0002a5d5c51b"},
+        {"RkEzMixerControl", "1f6c1960-bdb2-11de-af02-0002a5d5c51b"},
+        {"RkEzMixerDriver", "2578ddc0-bdb2-11de-81d0-0002a5d5c51b"},
+    };
+    const QList<RkClassFactory*>& factories = rkComponentsPlugin()->getClassFactories();
+    int previous = -1;
+    for (const auto& [className, guid] : expected) {
+        int row = -1;
+        for (int i = 0; i < factories.size(); ++i) {
+            if (factories[i]->className() == className)
+                row = i;
+        }
+        QVERIFY2(row > previous, qPrintable(className));
+        previous = row;
+        RkClassFactory* factory = factories[row];
+        QCOMPARE(factory->getGUID().toString(), guid);
+        QCOMPARE(rkApp->getPluginMgr()->findClassFactory(RkGUID::fromString(guid)), factory);
+        std::unique_ptr<QObject> object(factory->createInstance());
+        QVERIFY(object);
+        QCOMPARE(QString(object->metaObject()->className()), className);
+        QVERIFY(qobject_cast<RkBase*>(object.get()));
+    }
+    QCOMPARE(factories.last()->className(), QStringLiteral("RkFullScreenAction"));
+
+    std::unique_ptr<QObject> made(
+        rkApp->getPluginMgr()->findClassFactory(QStringLiteral("RkEzMixers"))->createInstance());
+    auto* mixers = qobject_cast<RkEzMixers*>(made.get());
+    QVERIFY(mixers);
+    QCOMPARE(mixers->getName(), QStringLiteral("RkEzMixers"));
+    QVERIFY(mixers->isPersistent());
 }
 
 void TestRkEzMixer::drive_data()
