@@ -161,6 +161,9 @@ int main(int argc, char** argv)
 
     core.getPluginMgr()->loadModules(folder);
     window.getPaneMgr()->createPanes();
+    // Scripts reach the window's widgets by object name: mainWindow.findChild("RkToolPaneDock").
+    QScriptEngine* engine = core.getScriptEngine();
+    engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
     window.getActionMgr()->buildMenus();
     // Help stays the last menu.
     window.addMenu(QStringLiteral("&Help"));

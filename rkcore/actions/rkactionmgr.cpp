@@ -82,6 +82,9 @@ void RkActionMgr::adopt(RkAction* action)
 {
     // Parented to the main window so that shortcuts work wherever focus is in it.
     action->setParent(d->mainWindow);
+    // Scripts and tests find an action by its class name.
+    if (action->objectName().isEmpty())
+        action->setObjectName(QString::fromLatin1(action->metaObject()->className()));
     if (action->shortcut().isEmpty() && !action->getDefaultAccel().isEmpty())
         action->setShortcut(action->getDefaultAccel());
     d->actions.insert(QString::fromLatin1(action->metaObject()->className()), action);
@@ -146,8 +149,16 @@ void RkActionMgr::buildMenus()
                 return ga < gb;
             return withoutMnemonic(a->text()).localeAwareCompare(withoutMnemonic(b->text())) < 0;
         });
+        // Plain entries go above the sub-menus of the same menu.
+        QAction* firstSubMenu = nullptr;
+        for (QAction* a : menu->actions()) {
+            if (a->menu()) {
+                firstSubMenu = a;
+                break;
+            }
+        }
         for (RkAction* action : list)
-            menu->addAction(action);
+            menu->insertAction(firstSubMenu, action);
     }
 }
 
