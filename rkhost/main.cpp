@@ -1,11 +1,15 @@
 #include "rkaboutplugins.h"
 #include "rkactionmgr.h"
 #include "rkapp.h"
+#include "rkdemoscene.h"
 #include "rkdemotools.h"
 #include "rkhostactions.h"
 #include "rkmainwindow.h"
 #include "rkpanemgr.h"
 #include "rkpluginmgr.h"
+#include "rkscene.h"
+#include "rkscenelist.h"
+#include "rkscenemenus.h"
 #include "rkstyle.h"
 #include "rkviewportmgr.h"
 
@@ -156,6 +160,9 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&Edit"));
     window.addMenu(QStringLiteral("&View"));
     window.addMenu(QStringLiteral("&Window"));
+    new RkSceneMenus(&window);
+    rkAddSceneList(&window);
+    rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
     rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());
 

@@ -5,12 +5,12 @@
 #include "rkcamera.h"
 #include "rkclassfactory.h"
 #include "rklight.h"
-#include "rkpluginmgr.h"
 #include "rkskeleton.h"
 
 #include <QHash>
 
-namespace {
+namespace
+{
 
 struct StoredClass {
     QString guid;
@@ -34,36 +34,24 @@ Registry& registry()
     static Registry r = [] {
         Registry core;
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a01"), &RkNode::staticMetaObject,
-            [] { return new RkNode; });
+                 [] { return new RkNode; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a02"),
-            &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
+                 &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a03"), &RkBone::staticMetaObject,
-            [] { return new RkBone; });
+                 [] { return new RkBone; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a04"),
-            &RkCamera::staticMetaObject, [] { return new RkCamera; });
+                 &RkCamera::staticMetaObject, [] { return new RkCamera; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a05"), &RkLight::staticMetaObject,
-            [] { return new RkLight; });
+                 [] { return new RkLight; });
         return core;
     }();
     return r;
 }
 
-// The class factory a module registered for a stored class, found by class name or GUID.
-RkClassFactory* moduleFactory(const QString& className, const QString& guid)
-{
-    RkPluginMgr* plugins = rkApp ? rkApp->getPluginMgr() : nullptr;
-    if (!plugins)
-        return nullptr;
-    RkClassFactory* factory = className.isEmpty()
-                                  ? plugins->findClassFactory(RkGUID::fromString(guid))
-                                  : plugins->findClassFactory(className);
-    return factory && factory->inherits(&RkBase::staticMetaObject) ? factory : nullptr;
-}
-
 } // namespace
 
 void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
-    std::function<RkBase*()> create)
+                           std::function<RkBase*()> create)
 {
     if (guid.isEmpty() || !metaObject || !create)
         return;
@@ -75,27 +63,32 @@ QString rkStoredClassGuid(const QString& className)
     const QString guid = registry().guidByClass.value(className);
     if (!guid.isEmpty())
         return guid;
-    RkClassFactory* factory = moduleFactory(className, QString());
-    return factory ? factory->getGUID().toString() : QString();
+    if (RkClassFactory* factory = RkApp::findClassFactory(className))
+        return factory->getGUID().toString();
+    return QString();
 }
 
 RkBase* rkCreateStoredObject(const QString& guid, QString* error)
 {
     const auto it = registry().byGuid.constFind(guid.toLower());
     if (it == registry().byGuid.constEnd()) {
-        if (RkClassFactory* factory = moduleFactory(QString(), guid)) {
-            QObject* made = factory->createInstance();
-            if (auto* object = qobject_cast<RkBase*>(made))
-                return object;
-            delete made;
+        // Classes of modules come from their class factories.
+        const RkGUID id = RkGUID::fromString(guid);
+        RkClassFactory* factory = id.isNull() ? nullptr : RkApp::findClassFactory(id);
+        if (!factory) {
             if (error)
-                *error = QStringLiteral("the class factory of %1 made nothing")
-                             .arg(factory->className());
+                *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
             return nullptr;
         }
-        if (error)
-            *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
-        return nullptr;
+        QObject* made = factory->createInstance();
+        auto* object = qobject_cast<RkBase*>(made);
+        if (!object) {
+            delete made;
+            if (error)
+                *error = QStringLiteral("%1 (GUID %2) is not a class that a scene can store")
+                             .arg(factory->className(), guid);
+        }
+        return object;
     }
     RkBase* object = it->create();
     if (!object && error)
