@@ -166,8 +166,8 @@ void RkEzMixerSolver::evaluateBasis(const QPoint& driver, std::vector<double>& p
         phi[i] = distance(driver, m_points[i]);
     phi[n] = 1.0;
     if (m_layout == Line) {
-        phi[n + 1] = (float(driver.x()) - m_originX) * m_dirX +
-                     (float(driver.y()) - m_originY) * m_dirY;
+        phi[n + 1] =
+            (float(driver.x()) - m_originX) * m_dirX + (float(driver.y()) - m_originY) * m_dirY;
     } else {
         phi[n + 1] = driver.x();
         phi[n + 2] = driver.y();

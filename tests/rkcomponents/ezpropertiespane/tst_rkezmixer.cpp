@@ -2,14 +2,11 @@
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
-#include "rkezmixersolver.h"
 
 #include "rkapp.h"
-#include "rkclassfactory.h"
 #include "rkcomponentsplugin.h"
 #include "rkfloatproperty.h"
 #include "rkoutfile.h"
-#include "rkplugin.h"
 #include "rkpluginmgr.h"
 #include "rkscene.h"
 #include "rkskeleton.h"
@@ -26,12 +23,14 @@
 
 namespace {
 
+const QVector<QPoint> kSlots = {{105, 42}, {168, 127}, {105, 212}, {42, 127},
+                                {149, 66}, {149, 187}, {60, 187},  {60, 66}};
+
 // A figure with morphs "Morph 0" .. "Morph n-1", all at 0.25 and clamped to [0, 1].
-RkSkeleton* makeFigure(int morphs)
+RkSkeleton* makeFigure(int morphs, const QString& name = QStringLiteral("Figure"))
 {
     auto* figure = new RkSkeleton;
-    figure->setName(QStringLiteral("Figure"));
-    figure->setLabel(QStringLiteral("Figure"));
+    figure->setName(name);
     for (int i = 0; i < morphs; ++i) {
         auto* morph = new RkFloatProperty(QString("Morph %1").arg(i), QString("Morph %1").arg(i));
         morph->setMinMax(0.f, 1.f);
@@ -47,30 +46,28 @@ RkFloatProperty* morph(RkNode* figure, int i)
     return qobject_cast<RkFloatProperty*>(figure->findProperty(QString("Morph %1").arg(i)));
 }
 
-// A thumbnail with a pattern of its own and transparent corners.
-QImage thumbnail(int seed)
+QVector<float> morphValues(RkNode* figure, int count, int first = 0)
 {
-    QImage image(85, 85, QImage::Format_ARGB32);
-    image.fill(Qt::transparent);
-    QPainter painter(&image);
-    painter.setPen(Qt::NoPen);
-    painter.setBrush(QColor::fromHsv(seed * 37 % 360, 200, 220));
-    painter.drawEllipse(QRect(4, 4, 77, 77));
-    painter.setBrush(QColor(seed * 20 % 256, 40, 90, 128));
-    painter.drawRect(20 + seed % 30, 30, 25, 20);
-    return image;
+    QVector<float> values;
+    for (int i = first; i < first + count; ++i)
+        values.append(morph(figure, i)->getValue());
+    return values;
 }
 
+// Controls on the figure's morphs from `first` on, each with a thumbnail of its own that has
+// transparent corners.
 RkEzMixer* makeMixer(RkNode* figure, const QVector<QPoint>& points, const QVector<float>& values,
-                     int firstMorph = 0)
+                     int first = 0)
 {
     auto* mixer = new RkEzMixer;
     for (int i = 0; i < points.size(); ++i) {
         auto* control = new RkEzMixerControl;
-        control->setControlProperty(morph(figure, firstMorph + i));
-        if (i < values.size())
-            control->setValue(values[i]);
-        control->setImage(thumbnail(firstMorph + i));
+        control->setControlProperty(morph(figure, first + i));
+        control->setValue(values.value(i, 1.f));
+        QImage image(85, 85, QImage::Format_ARGB32);
+        image.fill(Qt::transparent);
+        QPainter(&image).fillRect(10 + i, 20, 40, 30 + i, QColor(30 * i % 256, 90, 200, 180));
+        control->setImage(image);
         control->setX(points[i].x());
         control->setY(points[i].y());
         mixer->addControl(control);
@@ -78,77 +75,45 @@ RkEzMixer* makeMixer(RkNode* figure, const QVector<QPoint>& points, const QVecto
     return mixer;
 }
 
-QVector<float> morphValues(RkNode* figure, int count, int firstMorph = 0)
+// Empty when the values agree to 1e-4, else both lists for the failure message.
+QString mismatch(const QVector<float>& actual, const QVector<float>& expected)
 {
-    QVector<float> values;
-    for (int i = 0; i < count; ++i)
-        values.append(morph(figure, firstMorph + i)->getValue());
-    return values;
+    bool same = actual.size() == expected.size();
+    for (int i = 0; same && i < actual.size(); ++i)
+        same = std::fabs(actual[i] - expected[i]) <= 1e-4f;
+    if (same)
+        return QString();
+    QString text;
+    QDebug(&text) << actual << "instead of" << expected;
+    return text;
 }
 
-bool fuzzyEqual(const QVector<float>& a, const QVector<float>& b, float tolerance = 1e-4f)
-{
-    if (a.size() != b.size())
-        return false;
-    for (int i = 0; i < a.size(); ++i) {
-        if (!(std::fabs(a[i] - b[i]) <= tolerance))
-            return false;
-    }
-    return true;
-}
+#define COMPARE_VALUES(actual, expected)                                                           \
+    do {                                                                                           \
+        const QString text_ = mismatch((actual), (expected));                                      \
+        QVERIFY2(text_.isEmpty(), qPrintable(text_));                                              \
+    } while (false)
 
-QString toString(const QVector<float>& values)
-{
-    QStringList list;
-    for (float v : values)
-        list << QString::number(v);
-    return list.join(QStringLiteral(", "));
-}
-
-// Stand-ins that store one pointer list under a mixer section id but point at objects of the
-// wrong class. They are stored under GUIDs that load back as the real mixer classes, which then
-// meet the wrong objects.
-class OuterImpostor : public RkElementData {
+// Stores a pointer list under a mixer section id, but to an object of the wrong class. It is
+// stored under a GUID that loads back as a real mixer list, which then meets that object.
+class Impostor : public RkElementData {
     Q_OBJECT
 public:
-    OuterImpostor(short section, RkBase* target)
-        : RkElementData(QStringLiteral("RkEzMixers")), m_section(section), m_target(target)
+    explicit Impostor(RkBase* target)
+        : RkElementData(QStringLiteral("RkEzMixers")), m_target(target)
     {
         target->setParent(this);
     }
     void save(RkOutFile* file) const override
     {
-        file->startSection(m_section);
+        file->startSection(0x210);
         file->writePointer(m_target, 0);
         file->endSection();
     }
 
 private:
-    short m_section;
     RkBase* m_target;
 };
-
-class InnerImpostor : public RkBase {
-    Q_OBJECT
-public:
-    InnerImpostor(short section, RkBase* target) : m_section(section), m_target(target)
-    {
-        target->setParent(this);
-    }
-    void save(RkOutFile* file) const override
-    {
-        file->startSection(m_section);
-        file->writePointer(m_target, 0);
-        file->endSection();
-    }
-
-private:
-    short m_section;
-    RkBase* m_target;
-};
-
-const QVector<QPoint> kSlots = {{105, 42}, {168, 127}, {105, 212}, {42, 127},
-                                {149, 66}, {149, 187}, {60, 187},  {60, 66}};
 
 } // namespace
 
@@ -157,16 +122,13 @@ class TestRkEzMixer : public QObject {
 private Q_SLOTS:
     void initTestCase();
     void cleanup();
-    void factories();
     void drive_data();
     void drive();
     void controlsOnOnePointLeaveValues();
     void dragIsOneUndoEntry();
-    void deletedPropertyIsSkipped();
     void removalTakesOutAtOnceAndDeletesLater();
     void saveClearLoadRoundTrip();
-    void wrongClassFailsLoad_data();
-    void wrongClassFailsLoad();
+    void wrongClassIsRefused();
 };
 
 // The host makes stored mixers through the module's class factories.
@@ -178,46 +140,7 @@ void TestRkEzMixer::initTestCase()
 void TestRkEzMixer::cleanup()
 {
     rkScene->clear();
-    rkUndoStack->clear();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-}
-
-// Stored scenes name these classes by GUID, so the GUIDs, the classes they make and their order
-// in the module's table must hold.
-void TestRkEzMixer::factories()
-{
-    const QList<QPair<QString, QString>> expected = {
-        {"RkEzMixers", "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b"},
-        {"RkEzMixer", "19054e20-bdb2-11de-a0a6-0002a5d5c51b"},
-        {"RkEzMixerControl", "1f6c1960-bdb2-11de-af02-0002a5d5c51b"},
-        {"RkEzMixerDriver", "2578ddc0-bdb2-11de-81d0-0002a5d5c51b"},
-    };
-    const QList<RkClassFactory*>& factories = rkComponentsPlugin()->getClassFactories();
-    int previous = -1;
-    for (const auto& [className, guid] : expected) {
-        int row = -1;
-        for (int i = 0; i < factories.size(); ++i) {
-            if (factories[i]->className() == className)
-                row = i;
-        }
-        QVERIFY2(row > previous, qPrintable(className));
-        previous = row;
-        RkClassFactory* factory = factories[row];
-        QCOMPARE(factory->getGUID().toString(), guid);
-        QCOMPARE(rkApp->getPluginMgr()->findClassFactory(RkGUID::fromString(guid)), factory);
-        std::unique_ptr<QObject> object(factory->createInstance());
-        QVERIFY(object);
-        QCOMPARE(QString(object->metaObject()->className()), className);
-        QVERIFY(qobject_cast<RkBase*>(object.get()));
-    }
-    QCOMPARE(factories.last()->className(), QStringLiteral("RkFullScreenAction"));
-
-    std::unique_ptr<QObject> made(
-        rkApp->getPluginMgr()->findClassFactory(QStringLiteral("RkEzMixers"))->createInstance());
-    auto* mixers = qobject_cast<RkEzMixers*>(made.get());
-    QVERIFY(mixers);
-    QCOMPARE(mixers->getName(), QStringLiteral("RkEzMixers"));
-    QVERIFY(mixers->isPersistent());
 }
 
 void TestRkEzMixer::drive_data()
@@ -228,25 +151,19 @@ void TestRkEzMixer::drive_data()
     QTest::addColumn<QVector<float>>("expected");
 
     const QVector<QPoint> pair = {{40, 100}, {140, 100}};
-    QTest::newRow("pair, on control 0") << pair << QVector<float>{1.f, 0.5f} << QPoint(40, 100)
-                                        << QVector<float>{1.f, 0.f};
-    QTest::newRow("pair, halfway") << pair << QVector<float>{1.f, 0.5f} << QPoint(90, 100)
-                                   << QVector<float>{0.5f, 0.25f};
+    QTest::newRow("pair, halfway")
+        << pair << QVector<float>{1.f, 0.5f} << QPoint(90, 100) << QVector<float>{0.5f, 0.25f};
     // Weights are not clamped, and the plain setter stores values outside the morph's limits.
-    QTest::newRow("pair, beyond control 1") << pair << QVector<float>{1.f, 0.5f} << QPoint(190, 40)
-                                            << QVector<float>{-0.5f, 0.75f};
-    QTest::newRow("line of three, middle")
+    QTest::newRow("pair, beyond control 1")
+        << pair << QVector<float>{1.f, 0.5f} << QPoint(190, 40) << QVector<float>{-0.5f, 0.75f};
+    QTest::newRow("line of three")
         << QVector<QPoint>{{20, 20}, {120, 120}, {70, 70}} << QVector<float>{1.f, 1.f, 0.8f}
         << QPoint(70, 70) << QVector<float>{0.f, 0.f, 0.8f};
-    QTest::newRow("triangle, on control 2")
-        << kSlots.mid(0, 3) << QVector<float>{1.f, 1.f, 0.3f} << QPoint(105, 212)
-        << QVector<float>{0.f, 0.f, 0.3f};
     QTest::newRow("eight slots, on control 5")
         << kSlots << QVector<float>(8, 0.9f) << kSlots[5]
         << QVector<float>{0.f, 0.f, 0.f, 0.f, 0.f, 0.9f, 0.f, 0.f};
-    QTest::newRow("one control does nothing")
-        << QVector<QPoint>{{105, 42}} << QVector<float>{1.f} << QPoint(105, 42)
-        << QVector<float>{0.25f};
+    QTest::newRow("one control does nothing") << QVector<QPoint>{{105, 42}} << QVector<float>{1.f}
+                                              << QPoint(105, 42) << QVector<float>{0.25f};
 }
 
 void TestRkEzMixer::drive()
@@ -259,11 +176,8 @@ void TestRkEzMixer::drive()
     RkSkeleton* figure = makeFigure(points.size());
     rkScene->addNode(figure);
     std::unique_ptr<RkEzMixer> mixer(makeMixer(figure, points, values));
-
     mixer->getDriver()->moveTo(driver.x(), driver.y());
-    QCOMPARE(mixer->getDriver()->getPoint(), driver);
-    const QVector<float> actual = morphValues(figure, points.size());
-    QVERIFY2(fuzzyEqual(actual, expected), qPrintable(toString(actual)));
+    COMPARE_VALUES(morphValues(figure, points.size()), expected);
 }
 
 // Two controls on one point make the system singular: the move must leave every morph as it
@@ -272,14 +186,11 @@ void TestRkEzMixer::controlsOnOnePointLeaveValues()
 {
     RkSkeleton* figure = makeFigure(4);
     rkScene->addNode(figure);
-    for (const QVector<QPoint>& points :
-         {QVector<QPoint>{{60, 60}, {60, 60}},
-          QVector<QPoint>{{105, 42}, {168, 127}, {105, 212}, {168, 127}}}) {
-        std::unique_ptr<RkEzMixer> mixer(makeMixer(figure, points, {}));
-        for (const QPoint& p : {QPoint(60, 60), QPoint(105, 127), QPoint(168, 127)}) {
-            mixer->getDriver()->moveTo(p.x(), p.y());
-            QCOMPARE(morphValues(figure, points.size()), QVector<float>(points.size(), 0.25f));
-        }
+    std::unique_ptr<RkEzMixer> mixer(
+        makeMixer(figure, {{105, 42}, {168, 127}, {105, 212}, {168, 127}}, {}));
+    for (const QPoint& p : {QPoint(105, 127), QPoint(168, 127)}) {
+        mixer->getDriver()->moveTo(p.x(), p.y());
+        QCOMPARE(morphValues(figure, 4), QVector<float>(4, 0.25f));
     }
 }
 
@@ -293,27 +204,21 @@ void TestRkEzMixer::dragIsOneUndoEntry()
     const int entries = rkUndoStack->count();
 
     driver->startDrag();
-    QVERIFY(driver->isDragging());
-    for (int i = 0; i < 4; ++i)
-        QVERIFY(morph(figure, i)->isEditing());
-    for (const QPoint& p : {QPoint(110, 120), QPoint(130, 100), QPoint(150, 90), kSlots[1]})
+    QVERIFY(morph(figure, 3)->isEditing());
+    for (const QPoint& p : {QPoint(110, 120), QPoint(150, 90), kSlots[1]})
         driver->moveTo(p.x(), p.y());
     driver->endDrag();
-    QVERIFY(!driver->isDragging());
-    for (int i = 0; i < 4; ++i)
-        QVERIFY(!morph(figure, i)->isEditing());
-
-    const QVector<float> after = morphValues(figure, 4);
-    QVERIFY2(fuzzyEqual(after, {0.f, 0.8f, 0.f, 0.f}), qPrintable(toString(after)));
+    QVERIFY(!morph(figure, 3)->isEditing());
+    COMPARE_VALUES(morphValues(figure, 4), (QVector<float>{0.f, 0.8f, 0.f, 0.f}));
     QCOMPARE(rkUndoStack->count(), entries + 1);
     QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Shape Mixing"));
-
+    const QVector<float> after = morphValues(figure, 4);
     rkUndoStack->undo();
     QCOMPARE(morphValues(figure, 4), before);
     rkUndoStack->redo();
     QCOMPARE(morphValues(figure, 4), after);
 
-    // A drag whose release never came is closed as its own entry when the next one starts.
+    // A drag whose release never came is kept as its own entry when the next one starts.
     driver->startDrag();
     driver->moveTo(kSlots[2].x(), kSlots[2].y());
     driver->startDrag();
@@ -321,62 +226,27 @@ void TestRkEzMixer::dragIsOneUndoEntry()
     driver->endDrag();
     QCOMPARE(rkUndoStack->count(), entries + 3);
     rkUndoStack->undo();
-    const QVector<float> second = morphValues(figure, 4);
-    QVERIFY2(fuzzyEqual(second, {0.f, 0.f, 0.6f, 0.f}), qPrintable(toString(second)));
-}
-
-void TestRkEzMixer::deletedPropertyIsSkipped()
-{
-    RkSkeleton* figure = makeFigure(3);
-    rkScene->addNode(figure);
-    std::unique_ptr<RkEzMixer> mixer(makeMixer(figure, kSlots.mid(0, 3), {1.f, 1.f, 1.f}));
-    RkEzMixerControl* gone = mixer->getControls()[1];
-    figure->removeProperty(morph(figure, 1));
-    QVERIFY(!gone->getControlProperty());
-
-    // The control still shapes the field; only its write is skipped.
-    RkEzMixerDriver* driver = mixer->getDriver();
-    driver->startDrag();
-    driver->moveTo(120, 100);
-    driver->endDrag();
-    RkEzMixerSolver solver(kSlots.mid(0, 3));
-    QVector<float> w;
-    QVERIFY(solver.weights(QPoint(120, 100), w));
-    QVERIFY(std::fabs(morph(figure, 0)->getValue() - w[0]) < 1e-5f);
-    QVERIFY(std::fabs(morph(figure, 2)->getValue() - w[2]) < 1e-5f);
-    QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Shape Mixing"));
+    COMPARE_VALUES(morphValues(figure, 4), (QVector<float>{0.f, 0.f, 0.6f, 0.f}));
 }
 
 void TestRkEzMixer::removalTakesOutAtOnceAndDeletesLater()
 {
     RkEzMixers mixers;
-    QCOMPARE(mixers.getName(), QStringLiteral("RkEzMixers"));
-    auto* first = new RkEzMixer;
+    QPointer<RkEzMixer> first = new RkEzMixer;
     auto* second = new RkEzMixer;
     mixers.addMixer(first);
     mixers.addMixer(second);
-    auto* control = new RkEzMixerControl;
-    auto* kept = new RkEzMixerControl;
+    QPointer<RkEzMixerControl> control = new RkEzMixerControl;
     second->addControl(control);
-    second->addControl(kept);
     QCOMPARE(control->getMixer(), second);
 
-    QPointer<RkEzMixer> firstGuard(first);
-    QPointer<RkEzMixerControl> controlGuard(control);
     mixers.removeMixer(first);
     second->removeControl(control);
     QCOMPARE(mixers.getMixers(), QVector<RkEzMixer*>{second});
-    QCOMPARE(second->getControls(), QVector<RkEzMixerControl*>{kept});
-    QVERIFY(firstGuard && controlGuard);
-
-    // Something that is not there is left alone.
-    mixers.removeMixer(first);
-    second->removeControl(control);
-    QCOMPARE(mixers.getMixers().size(), 1);
-    QCOMPARE(second->getControls().size(), 1);
-
+    QVERIFY(second->getControls().isEmpty());
+    QVERIFY(first && control);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    QVERIFY(!firstGuard && !controlGuard);
+    QVERIFY(!first && !control);
 }
 
 void TestRkEzMixer::saveClearLoadRoundTrip()
@@ -386,46 +256,30 @@ void TestRkEzMixer::saveClearLoadRoundTrip()
     auto* mixers = new RkEzMixers;
     figure->addDataItem(mixers);
     mixers->addMixer(makeMixer(figure, {{30, 40}, {170, 60}, {100, 200}}, {1.f, 0.5f, 0.75f}));
-    QVector<QPoint> nine = kSlots;
-    nine.append(QPoint(105, 127));
-    QVector<float> nineValues;
-    for (int i = 0; i < 9; ++i)
-        nineValues.append(1.f - 0.05f * i);
+    const QVector<QPoint> nine = kSlots + QVector<QPoint>{{105, 127}};
+    const QVector<float> nineValues = {1.f, 0.9f, 0.8f, 0.7f, 0.6f, 0.5f, 0.4f, 0.3f, 0.2f};
     mixers->addMixer(makeMixer(figure, nine, nineValues, 3));
     mixers->getMixers()[0]->getDriver()->moveTo(120, 90);
-    mixers->getMixers()[1]->getDriver()->moveTo(nine[4].x(), nine[4].y());
     // The last control's morph is gone: it is stored as a null pointer.
     figure->removeProperty(morph(figure, 11));
 
-    struct Saved {
-        QVector<QPoint> points;
-        QVector<float> values;
-        QVector<QImage> images;
-        QVector<QString> properties;
-        QPoint driver;
-    };
-    QVector<Saved> saved;
+    QVector<QVector<RkEzMixerControl*>> saved;
+    QStringList morphs; // the morph of each control, by name, as the clear deletes them
     for (RkEzMixer* mixer : mixers->getMixers()) {
-        Saved s;
-        for (RkEzMixerControl* control : mixer->getControls()) {
-            s.points.append(control->getPoint());
-            s.values.append(control->getValue());
-            s.images.append(control->getImage());
-            s.properties.append(control->getControlProperty()
-                                    ? control->getControlProperty()->getName()
-                                    : QString());
-        }
-        s.driver = mixer->getDriver()->getPoint();
-        saved.append(s);
+        saved.append(mixer->getControls());
+        for (RkEzMixerControl* control : mixer->getControls())
+            morphs << (control->getControlProperty() ? control->getControlProperty()->getName()
+                                                     : QString());
     }
-    QCOMPARE(saved[1].properties.last(), QString());
-
+    QCOMPARE(morphs.last(), QString());
     QTemporaryDir dir;
     const QString path = dir.filePath(QStringLiteral("mixers.rks"));
     QString error;
     QVERIFY2(rkScene->save(path, &error), qPrintable(error));
+    // Keep the originals to compare with while the scene is cleared.
+    figure->takeDataItem(mixers);
+    std::unique_ptr<RkEzMixers> original(mixers);
     rkScene->clear();
-    QCOMPARE(rkScene->getNumNodes(), 0);
     QVERIFY2(rkScene->load(path, &error), qPrintable(error));
 
     RkNode* loaded = rkScene->findNode(QStringLiteral("Figure"));
@@ -435,90 +289,83 @@ void TestRkEzMixer::saveClearLoadRoundTrip()
     QCOMPARE(loadedMixers->getMixers().size(), 2);
     for (int m = 0; m < 2; ++m) {
         RkEzMixer* mixer = loadedMixers->getMixers()[m];
-        QCOMPARE(mixer->getDriver()->getPoint(), saved[m].driver);
-        QCOMPARE(mixer->getControls().size(), saved[m].points.size());
-        for (int i = 0; i < mixer->getControls().size(); ++i) {
+        QCOMPARE(mixer->getDriver()->getPoint(), original->getMixers()[m]->getDriver()->getPoint());
+        QCOMPARE(mixer->getControls().size(), saved[m].size());
+        for (int i = 0; i < saved[m].size(); ++i) {
             RkEzMixerControl* control = mixer->getControls()[i];
+            RkEzMixerControl* was = saved[m][i];
             QCOMPARE(control->getMixer(), mixer);
-            QCOMPARE(control->getPoint(), saved[m].points[i]);
-            QCOMPARE(control->getValue(), saved[m].values[i]);
-            QCOMPARE(control->getImage().convertToFormat(QImage::Format_ARGB32),
-                     saved[m].images[i]);
-            RkFloatProperty* property = control->getControlProperty();
-            QCOMPARE(property ? property->getName() : QString(), saved[m].properties[i]);
-            if (property)
-                QCOMPARE(property->getElement(), loaded);
+            QCOMPARE(control->getPoint(), was->getPoint());
+            QCOMPARE(control->getValue(), was->getValue());
+            QCOMPARE(control->getImage().convertToFormat(QImage::Format_ARGB32), was->getImage());
+            const QString name = morphs.takeFirst();
+            QCOMPARE(control->getControlProperty(),
+                     name.isEmpty() ? nullptr : loaded->findProperty(name));
         }
     }
+    QCOMPARE(mixers->getMixers()[0]->getDriver()->getPoint(), QPoint(120, 90));
 
-    // A loaded mixer drags like a new one: its morphs are edited, driven and undone as one.
-    RkEzMixer* mixer = loadedMixers->getMixers()[1];
-    RkEzMixerDriver* driver = mixer->getDriver();
+    // A loaded mixer drags like a new one: its morphs are edited, driven and undone as one,
+    // and the control whose morph is gone is skipped.
+    RkEzMixerDriver* driver = loadedMixers->getMixers()[1]->getDriver();
     const QVector<float> before = morphValues(loaded, 8, 3);
     const int entries = rkUndoStack->count();
     driver->startDrag();
-    for (int i = 0; i < 8; ++i)
-        QVERIFY(morph(loaded, 3 + i)->isEditing());
+    QVERIFY(morph(loaded, 3)->isEditing());
     driver->moveTo(nine[0].x() + 5, nine[0].y() + 5);
     driver->moveTo(nine[2].x(), nine[2].y());
     driver->endDrag();
     QVERIFY(!morph(loaded, 3)->isEditing());
-    QVector<float> expected(8, 0.f);
-    expected[2] = nineValues[2];
-    QVERIFY2(fuzzyEqual(morphValues(loaded, 8, 3), expected),
-             qPrintable(toString(morphValues(loaded, 8, 3))));
+    COMPARE_VALUES(morphValues(loaded, 8, 3),
+                   (QVector<float>{0.f, 0.f, 0.8f, 0.f, 0.f, 0.f, 0.f, 0.f}));
     QCOMPARE(rkUndoStack->count(), entries + 1);
     QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Shape Mixing"));
     rkUndoStack->undo();
     QCOMPARE(morphValues(loaded, 8, 3), before);
 }
 
-void TestRkEzMixer::wrongClassFailsLoad_data()
+void TestRkEzMixer::wrongClassIsRefused()
 {
-    QTest::addColumn<int>("row");
-    QTest::newRow("a control in the mixer list") << 0;
-    QTest::newRow("a driver in a control list") << 1;
-    QTest::newRow("a control as the driver") << 2;
-}
+    // Every stored pointer is checked as it is resolved; a null one passes.
+    RkEzMixers mixers;
+    RkEzMixer mixer;
+    RkEzMixerControl control;
+    RkEzMixerDriver driver;
+    const QString message = QStringLiteral("Failure to cast RkAssertCast");
+    QVERIFY_EXCEPTION_THROWN(mixers.setPointer(nullptr, 0x210, 0, &control), QString);
+    QVERIFY_EXCEPTION_THROWN(mixer.setPointer(nullptr, 0x220, 0, &driver), QString);
+    QVERIFY_EXCEPTION_THROWN(mixer.setPointer(nullptr, 0x230, 0, &control), QString);
+    try {
+        control.setPointer(nullptr, 0x221, 0, &mixer);
+        QFAIL("a mixer taken for a morph");
+    } catch (const QString& e) {
+        QCOMPARE(e, message);
+    }
+    mixer.setPointer(nullptr, 0x230, 0, nullptr);
+    control.setPointer(nullptr, 0x221, 0, nullptr);
+    QVERIFY(mixer.getDriver() && mixer.getControls().isEmpty() && mixers.getMixers().isEmpty());
 
-void TestRkEzMixer::wrongClassFailsLoad()
-{
-    QFETCH(int, row);
-
-    // Whatever an impostor is stored as loads back as a real mixer list or mixer.
-    rkRegisterStoredClass(QString("6a0f3c2e-0000-4000-8000-00000000000%1").arg(row),
-                          &OuterImpostor::staticMetaObject, [] { return new RkEzMixers; });
-    rkRegisterStoredClass(QString("6a0f3c2e-0000-4000-8000-00000000001%1").arg(row),
-                          &InnerImpostor::staticMetaObject, [] { return new RkEzMixer; });
+    // In a file, the load fails with that message and the open scene stays as it was.
+    rkRegisterStoredClass(QStringLiteral("6a0f3c2e-0000-4000-8000-000000000001"),
+                          &Impostor::staticMetaObject, [] { return new RkEzMixers; });
     RkSkeleton* figure = makeFigure(1);
-    if (row == 0)
-        figure->addDataItem(new OuterImpostor(0x210, new RkEzMixerControl));
-    else if (row == 1)
-        figure->addDataItem(
-            new OuterImpostor(0x210, new InnerImpostor(0x220, new RkEzMixerDriver)));
-    else
-        figure->addDataItem(
-            new OuterImpostor(0x210, new InnerImpostor(0x230, new RkEzMixerControl)));
+    figure->addDataItem(new Impostor(new RkEzMixerControl));
     rkScene->addNode(figure);
     QTemporaryDir dir;
     const QString path = dir.filePath(QStringLiteral("impostor.rks"));
     QString error;
     QVERIFY2(rkScene->save(path, &error), qPrintable(error));
     rkScene->clear();
-
-    // The scene the user has open keeps everything when the load fails.
-    RkSkeleton* kept = makeFigure(2);
-    kept->setName(QStringLiteral("Kept"));
+    RkSkeleton* kept = makeFigure(2, QStringLiteral("Kept"));
     auto* keptMixers = new RkEzMixers;
-    keptMixers->addMixer(makeMixer(kept, kSlots.mid(0, 2), {1.f, 1.f}));
+    keptMixers->addMixer(makeMixer(kept, kSlots.mid(0, 2), {}));
     kept->addDataItem(keptMixers);
     rkScene->addNode(kept);
 
     QVERIFY(!rkScene->load(path, &error));
-    QVERIFY2(error.contains(QStringLiteral("Failure to cast RkAssertCast")), qPrintable(error));
+    QVERIFY2(error.contains(message), qPrintable(error));
     QCOMPARE(rkScene->getNodes(), RkNodeList{kept});
     QCOMPARE(kept->findDataItem(QStringLiteral("RkEzMixers")), keptMixers);
-    QCOMPARE(keptMixers->getMixers().size(), 1);
     QCOMPARE(keptMixers->getMixers()[0]->getControls().size(), 2);
 }
 
