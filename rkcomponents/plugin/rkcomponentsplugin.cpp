@@ -1,5 +1,9 @@
 #include "rkcomponentsplugin.h"
 
+#include "rkezmixer.h"
+#include "rkezmixercontrol.h"
+#include "rkezmixerdriver.h"
+#include "rkezmixers.h"
 #include "rkfullscreenaction.h"
 #include "rkfullscreenactionfactory.h"
 #include "rkplugin.h"
@@ -45,6 +49,11 @@ ComponentsPlugin s_plugin;
 
 RK_NAMED_FACTORY(RkToolPane, "56C51F21-B8D3-4895-9E00-6C8975018A22")
 RK_NAMED_FACTORY(RkToolPaneAction, "255648F4-B646-4dec-B18C-A5FDB71B8C61")
+
+RK_NAMED_FACTORY(RkEzMixers, "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b")
+RK_NAMED_FACTORY(RkEzMixer, "19054e20-bdb2-11de-a0a6-0002a5d5c51b")
+RK_NAMED_FACTORY(RkEzMixerControl, "1f6c1960-bdb2-11de-af02-0002a5d5c51b")
+RK_NAMED_FACTORY(RkEzMixerDriver, "2578ddc0-bdb2-11de-81d0-0002a5d5c51b")
 
 static const RkGUID RkFullScreenAction_GUID =
     RkGUID::fromString(QStringLiteral("8A77FD58-BE3E-4434-93EF-BB41DA6DBDB4"));
