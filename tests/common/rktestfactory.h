@@ -1,0 +1,15 @@
+#pragma once
+
+#include "rkclassfactory.h"
+#include "rkguid.h"
+
+// A class factory for test classes: makes T with its parameterless constructor.
+template <typename T>
+class RkTestFactory : public RkClassFactory {
+public:
+    explicit RkTestFactory(const char* guid)
+        : RkClassFactory(&T::staticMetaObject, RkGUID::fromString(QLatin1String(guid)))
+    {
+    }
+    QObject* createInstance() override { return new T; }
+};
