@@ -14,8 +14,8 @@ class RkPolyMesh;
 class RkSubDMesh;
 
 // The demo content's meshes, built in code: a humanoid figure (about 1.8 units tall, standing on
-// y = 0 and facing +z) made of body parts, each part one UV island bound to one bone, with morph
-// targets per body region; and a subdivision cage for the prop.
+// y = 0, facing +z, arms out to the sides) made of body parts, each part one UV island that
+// follows one bone, with morph targets per body region; and a subdivision cage for the prop.
 class RKCORE_EXPORT RkDemoMesh
 {
 public:
@@ -24,9 +24,21 @@ public:
     RkDemoMesh();
     ~RkDemoMesh();
 
-    // A new copy of the figure's rest mesh; the caller owns it.
+    // The whole figure in its rest pose, as one mesh; the caller owns it.
     std::unique_ptr<RkPolyMesh> createFigureMesh() const;
-    static std::unique_ptr<RkSubDMesh> createPropMesh();
+    // The bone each vertex of the whole mesh follows, as an index into boneNames().
+    const QVector<int>& vertexBones() const;
+    // The morph targets of the whole mesh; offsets at full strength.
+    const QVector<RkMorphDeltas>& morphs() const;
+
+    // The part of the figure one bone carries, with its own vertices and UV values (the UVs keep
+    // their place in the figure's layout); null for a bone that carries nothing.
+    std::unique_ptr<RkPolyMesh> createBoneMesh(int bone) const;
+    // The morph targets restricted to that bone's mesh; morphs that do not touch it are left out.
+    QVector<RkMorphDeltas> boneMorphs(int bone) const;
+
+    // A rounded box of four-corner patches around centre.
+    static std::unique_ptr<RkSubDMesh> createPropMesh(const RkVec3& centre);
 
     static QStringList materialNames();
     static QVector<QColor> materialColours();
@@ -36,12 +48,8 @@ public:
     static QStringList boneNames();
     static int boneParent(int bone);
     static RkVec3 jointCentre(int bone);
-    // The bone each vertex of the figure mesh is bound to, as an index into boneNames().
-    const QVector<int>& vertexBones() const;
 
-    // The morph targets, named; offsets at full strength.
-    const QVector<RkMorphDeltas>& morphs() const;
-    // The body region a morph shapes ("Head", "Face", "Ears", "Body", "Arms", "Legs").
+    // The body region a morph shapes: "head", "face", "ears", "body", "arms" or "legs".
     static QString morphRegion(const QString& morph);
 
 private:
