@@ -3,13 +3,63 @@
 #include "rkcoreglobal.h"
 
 #include <QObject>
+#include <QVariant>
+
+#include <memory>
+
+class RkProperty;
 
 // The application's undo stack. Owned by RkApp; rkUndoStack points at it.
+// Changes are recorded only while an RkUndoStackHold is open; the outermost hold turns them
+// into one entry when accepted, or takes them all back when cancelled. Changes made with no
+// hold open are not undoable.
 class RKCORE_EXPORT RkUndoStack : public QObject {
     Q_OBJECT
 public:
     explicit RkUndoStack(QObject* parent = nullptr);
     ~RkUndoStack() override;
+
+    // True while a hold is open.
+    bool canPushItems() const;
+    int holdDepth() const;
+
+    bool canUndo() const;
+    bool canRedo() const;
+    QString getUndoCaption() const;
+    QString getRedoCaption() const;
+    int count() const;
+    int index() const;
+
+    // Called by properties after a value change; ignored when no hold is open.
+    void recordPropertyChange(RkProperty* property, const QVariant& oldValue,
+        const QVariant& newValue);
+
+public Q_SLOTS:
+    // Both do nothing while a hold is open.
+    void undo();
+    void redo();
+    // Forgets every entry (a hold that is open keeps its own changes).
+    void clear();
+
+Q_SIGNALS:
+    void undoCaptionChanged(const QString& caption);
+    void redoCaptionChanged(const QString& caption);
+    void canUndoChanged(bool on);
+    void canRedoChanged(bool on);
+
+private:
+    friend class RkUndoStackHold;
+    // Holds are known by an id that is never reused, so a hold closed along with an outer one
+    // cannot close a later one.
+    int openHold();
+    int holdLevel(int id) const;
+    void acceptHold(int id, const QString& caption);
+    void cancelHold(int id);
+    void notifyCaptions(const QString& oldUndo, const QString& oldRedo, bool oldCanUndo,
+        bool oldCanRedo);
+
+    struct Private;
+    std::unique_ptr<Private> d;
 };
 
 RKCORE_EXPORT extern RkUndoStack* rkUndoStack;

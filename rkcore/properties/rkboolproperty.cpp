@@ -1,0 +1,81 @@
+#include "rkboolproperty.h"
+
+#include "rkinfile.h"
+#include "rkoutfile.h"
+
+RkBoolProperty::RkBoolProperty(const QString& name, const QString& label, QObject* parent)
+    : RkProperty(name, label, parent)
+{
+}
+
+RkBoolProperty::~RkBoolProperty() = default;
+
+bool RkBoolProperty::getValue() const
+{
+    return m_value;
+}
+
+bool RkBoolProperty::setValue(bool value)
+{
+    if (value == m_value)
+        return true;
+    const bool old = m_value;
+    m_value = value;
+    valueChanged(QVariant(old));
+    return true;
+}
+
+bool RkBoolProperty::getDefaultValue() const
+{
+    return m_default;
+}
+
+void RkBoolProperty::setDefaultValue(bool value)
+{
+    m_default = value;
+}
+
+QString RkBoolProperty::widgetClassName() const
+{
+    return QStringLiteral("RkBoolPropertyWgt");
+}
+
+void RkBoolProperty::beginEdit()
+{
+    m_editStart = m_value;
+    RkProperty::beginEdit();
+}
+
+void RkBoolProperty::cancelEdit()
+{
+    if (isEditing())
+        setValue(m_editStart);
+    RkProperty::cancelEdit();
+}
+
+QVariant RkBoolProperty::getValueVariant() const
+{
+    return QVariant(m_value);
+}
+
+bool RkBoolProperty::setValueVariant(const QVariant& value)
+{
+    if (value.type() != QVariant::Bool)
+        return false;
+    return setValue(value.toBool());
+}
+
+void RkBoolProperty::saveState(RkOutFile* file) const
+{
+    file->writeBool(m_value);
+    file->writeBool(m_default);
+}
+
+void RkBoolProperty::loadState(RkInFile* file)
+{
+    bool value = false, def = false;
+    if (!file->readBool(value) || !file->readBool(def))
+        return;
+    setDefaultValue(def);
+    setValue(value);
+}
