@@ -1,7 +1,15 @@
 #include "rkdemomesh.h"
 
+#include "rkbone.h"
+#include "rkdemoscene.h"
+#include "rkfloatproperty.h"
 #include "rkmap.h"
+#include "rkmaterial.h"
+#include "rkobject.h"
 #include "rkpolymesh.h"
+#include "rkscene.h"
+#include "rkshape.h"
+#include "rkskeleton.h"
 #include "rksubdmesh.h"
 
 #include <QHash>
@@ -212,7 +220,8 @@ QVector<PartDef> partDefs()
             continue;
         PartDef r = parts[i];
         r.name = "r" + r.name.mid(1);
-        r.bone = "r" + r.bone.mid(1);
+        if (r.bone.startsWith('l'))
+            r.bone = "r" + r.bone.mid(1);
         r.a = mirror(r.a);
         r.b = mirror(r.b);
         parts.append(r);
@@ -328,7 +337,7 @@ QVector<MorphDef> morphDefs()
              const float up = std::max(0.0f, v.t - 0.4f) / 0.6f;
              return RkVec3(0, 0.05f * up * up, -0.02f * up);
          }},
-        {"EarsLarge", "ears", both, scalePartAbout(0.5f, 1.6f)},
+        {"EarsLarge", "ears", both, scalePartAbout(0.5f, 2.0f)},
         {"EarsBack", "ears", both,
          [](const VertexInfo& v, const PartDef& p) {
              // Turn the ear backwards about its front edge.
@@ -436,7 +445,8 @@ RkDemoMesh::RkDemoMesh() : d(std::make_unique<Private>())
     for (int pi = 0; pi < parts.size(); ++pi) {
         const PartDef& p = parts[pi];
         const int bone = boneIndex(p.bone);
-        Q_ASSERT(bone >= 0);
+        if (bone < 0)
+            continue;
         const RkVec3 axis = axisOf(p);
         const RkVec3 ref = std::fabs(axis.z) > 0.9f ? RkVec3(0, 1, 0) : RkVec3(0, 0, 1);
         const RkVec3 u = axis.cross(ref).normalized();
@@ -734,3 +744,85 @@ QString RkDemoMesh::morphRegion(const QString& morph)
     }
     return QString();
 }
+
+const RkDemoMesh& RkDemoMesh::instance()
+{
+    static const RkDemoMesh mesh;
+    return mesh;
+}
+
+void RkDemoMesh::buildFigure(RkNode* node)
+{
+    auto* figure = qobject_cast<RkSkeleton*>(node);
+    if (!figure)
+        return;
+    const RkDemoMesh& demo = instance();
+
+    // The figure's own object holds the materials its bones share; a rebuild replaces them all.
+    auto* holder = new RkObject(QStringLiteral("Figure"));
+    auto* materialShape = new RkShape(QStringLiteral("Materials"));
+    QList<RkMaterial*> materials;
+    const QStringList names = materialNames();
+    const QVector<QColor> colours = materialColours();
+    for (int i = 0; i < names.size(); ++i) {
+        auto* m = new RkMaterial(names[i]);
+        m->setDiffuseColor(colours[i]);
+        materialShape->addMaterial(m);
+        materials.append(m);
+    }
+    holder->addShape(materialShape);
+
+    QList<RkBone*> bones;
+    figure->getAllBones(bones);
+    const QStringList known = boneNames();
+    for (RkBone* bone : bones) {
+        const int index = known.indexOf(bone->getName());
+        std::unique_ptr<RkPolyMesh> mesh = index >= 0 ? demo.createBoneMesh(index) : nullptr;
+        if (!mesh) {
+            bone->setObject(nullptr);
+            continue;
+        }
+        auto* object = new RkObject(bone->getName());
+        auto* shape = new RkShape(bone->getName());
+        for (RkMaterial* m : materials)
+            shape->addMaterial(m);
+        object->addShape(shape);
+        object->setGeometry(mesh.release());
+        for (const RkMorphDeltas& morph : demo.boneMorphs(index)) {
+            if (auto* p = qobject_cast<RkFloatProperty*>(figure->findProperty(morph.name)))
+                object->addMorph(morph, p);
+        }
+        bone->setObject(object);
+    }
+    // Set last: the old materials (and with them the old holder) go only now that no new shape
+    // refers to them.
+    figure->setObject(holder);
+}
+
+void RkDemoMesh::buildProp(RkNode* node)
+{
+    if (!node)
+        return;
+    const QVector3D o = node->getOrigin();
+    auto* object = new RkObject(QStringLiteral("Ball"));
+    auto* shape = new RkShape(QStringLiteral("Ball"));
+    auto* material = new RkMaterial(QStringLiteral("Ball"));
+    material->setDiffuseColor(QColor(214, 120, 52));
+    shape->addMaterial(material);
+    object->addShape(shape);
+    object->setGeometry(createPropMesh(RkVec3(o.x(), o.y(), o.z())).release());
+    node->setObject(object);
+}
+
+namespace
+{
+
+// The demo nodes name their content by source; these builders make it whenever such a node is
+// built or loaded.
+const bool kBuildersRegistered = [] {
+    RkScene::registerSourceBuilder(QLatin1String(RkDemoFigureSource), &RkDemoMesh::buildFigure);
+    RkScene::registerSourceBuilder(QLatin1String(RkDemoPropSource), &RkDemoMesh::buildProp);
+    return true;
+}();
+
+} // namespace

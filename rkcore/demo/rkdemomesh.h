@@ -10,6 +10,7 @@
 
 #include <memory>
 
+class RkNode;
 class RkPolyMesh;
 class RkSubDMesh;
 
@@ -51,6 +52,16 @@ public:
 
     // The body region a morph shapes: "head", "face", "ears", "body", "arms" or "legs".
     static QString morphRegion(const QString& morph);
+
+    // Gives a figure (an RkSkeleton) and each of its bones their objects: every bone carries its
+    // part of the mesh, driven by the figure's morph properties of the same names; the figure's
+    // own object holds the shared materials. Bones the mesh does not know stay empty. Anything
+    // built before is replaced.
+    static void buildFigure(RkNode* figure);
+    // Gives a node the prop's subdivision mesh around the node's origin, with its own material.
+    static void buildProp(RkNode* prop);
+    // The mesh every figure is built from, made once.
+    static const RkDemoMesh& instance();
 
 private:
     struct Private;

@@ -82,10 +82,11 @@ const QVector<RkDemoMorph>& rkDemoMorphs()
     return morphs;
 }
 
-namespace {
+namespace
+{
 
 RkFloatProperty* addFloat(RkNode* node, const QString& name, const QString& label,
-    const QString& group, float min, float max, float value)
+                          const QString& group, float min, float max, float value)
 {
     auto* p = new RkFloatProperty(name, label);
     p->setMinMax(min, max);
@@ -109,13 +110,15 @@ RkSkeleton* buildFigure(RkScene* scene)
         p->setSensitivity(0.01f);
     }
     // A corrective morph the user is not meant to dial.
-    RkFloatProperty* correction = addFloat(figure, QStringLiteral("BodyCorrection"),
-        QStringLiteral("Body Correction"), QStringLiteral("Morphs/Body"), 0, 1, 0);
+    RkFloatProperty* correction =
+        addFloat(figure, QStringLiteral("BodyCorrection"), QStringLiteral("Body Correction"),
+                 QStringLiteral("Morphs/Body"), 0, 1, 0);
     correction->setHidden(true);
     correction->setDisplayAsPercent(true);
 
-    RkFloatProperty* bend = addFloat(figure, QStringLiteral("BendStrength"),
-        QStringLiteral("Bend Strength"), QStringLiteral("Deformers"), 0, 1, 1);
+    RkFloatProperty* bend =
+        addFloat(figure, QStringLiteral("BendStrength"), QStringLiteral("Bend Strength"),
+                 QStringLiteral("Deformers"), 0, 1, 1);
     bend->setDisplayAsPercent(true);
     bend->setClamped(true);
     auto* bending = new RkBoolProperty(QStringLiteral("Bend"), QStringLiteral("Bend"));
@@ -124,12 +127,13 @@ RkSkeleton* buildFigure(RkScene* scene)
     figure->addProperty(bending, QStringLiteral("Deformers"));
 
     // A group without any float property.
-    auto* shadows = new RkBoolProperty(QStringLiteral("CastShadows"), QStringLiteral("Cast Shadows"));
+    auto* shadows =
+        new RkBoolProperty(QStringLiteral("CastShadows"), QStringLiteral("Cast Shadows"));
     shadows->setDefaultValue(true);
     shadows->setValue(true);
     figure->addProperty(shadows, QStringLiteral("Display"));
-    auto* level = new RkIntProperty(QStringLiteral("SubdivisionLevel"),
-        QStringLiteral("Subdivision Level"));
+    auto* level =
+        new RkIntProperty(QStringLiteral("SubdivisionLevel"), QStringLiteral("Subdivision Level"));
     level->setMinMax(0, 3);
     level->setClamped(true);
     figure->addProperty(level, QStringLiteral("Display"));
@@ -146,8 +150,8 @@ RkSkeleton* buildFigure(RkScene* scene)
         bone->setNodeParent(parent);
         // Only the hip moves the figure about; other bones only turn.
         if (b.name != QLatin1String("hip")) {
-            for (RkFloatProperty* p : {bone->getXTranslate(), bone->getYTranslate(),
-                     bone->getZTranslate()})
+            for (RkFloatProperty* p :
+                 {bone->getXTranslate(), bone->getYTranslate(), bone->getZTranslate()})
                 p->setHidden(true);
         }
         bone->getScale()->setHidden(true);

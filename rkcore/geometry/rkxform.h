@@ -3,7 +3,8 @@
 #include "rkcoreglobal.h"
 #include "rkvec3.h"
 
-// A rigid transform: rotation (3x3, row-major) followed by a translation. p' = R p + t.
+// An affine transform: a 3x3 linear part (row-major; a rotation, possibly scaled) followed by a
+// translation. p' = R p + t.
 class RKCORE_EXPORT RkXform
 {
 public:

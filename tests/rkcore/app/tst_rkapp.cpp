@@ -1,11 +1,12 @@
 #include "rkapp.h"
 #include "rkscene.h"
-#include "rkundostack.h"
 #include "rktestmain.h"
+#include "rkundostack.h"
 
 #include <QSignalSpy>
 
-class TestRkApp : public QObject {
+class TestRkApp : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void globalsLiveWithTheApp();

@@ -1,4 +1,5 @@
 #include "rkdemomesh.h"
+#include "rkdemoscene.h"
 #include "rkmap.h"
 #include "rkpolymesh.h"
 #include "rksubdmesh.h"
@@ -18,6 +19,7 @@ private Q_SLOTS:
     void morphsShapeTheirRegionOnly();
     void bonesFormAHierarchy();
     void propIsASubdivisionCage();
+    void fitsTheDemoFigure();
 
 private:
     RkDemoMesh m_demo;
@@ -95,12 +97,12 @@ void TestRkDemoMesh::morphsShapeTheirRegionOnly()
             const RkVec3 p = mesh->getVertices()[m.indices[i]];
             largest = std::max(largest, m.deltas[i].length());
             // Head, face and ear morphs stay on the head; leg morphs below the hips.
-            if (region == QLatin1String("Head") || region == QLatin1String("Face") ||
-                region == QLatin1String("Ears"))
+            if (region == QLatin1String("head") || region == QLatin1String("face") ||
+                region == QLatin1String("ears"))
                 QVERIFY2(p.y > 1.45f, qPrintable(m.name));
-            if (region == QLatin1String("Legs"))
+            if (region == QLatin1String("legs"))
                 QVERIFY2(p.y < 1.0f, qPrintable(m.name));
-            if (region == QLatin1String("Arms"))
+            if (region == QLatin1String("arms"))
                 QVERIFY2(std::fabs(p.x) > 0.15f, qPrintable(m.name));
         }
         // Visible: at least 5 mm somewhere.
@@ -140,7 +142,7 @@ void TestRkDemoMesh::bonesFormAHierarchy()
 
 void TestRkDemoMesh::propIsASubdivisionCage()
 {
-    const auto prop = RkDemoMesh::createPropMesh();
+    const auto prop = RkDemoMesh::createPropMesh(RkVec3(0.6f, 0.2f, 0.3f));
     QCOMPARE(prop->getNumPatches(), 54);
     // Corners shared between faces are welded: a closed 3x3x3 cube cage has 56 vertices.
     QCOMPARE(prop->getNumVertices(), 56);
@@ -148,6 +150,43 @@ void TestRkDemoMesh::propIsASubdivisionCage()
     RkVec3 lo, hi;
     QVERIFY(prop->getBounds(lo, hi));
     QVERIFY(lo.x > 0.3f); // beside the figure, not inside it
+}
+
+void TestRkDemoMesh::fitsTheDemoFigure()
+{
+    // The mesh turns about the figure's joints and has a target for each of its morphs, in the
+    // region the figure files it under.
+    const QStringList bones = RkDemoMesh::boneNames();
+    QCOMPARE(bones.size(), rkDemoBones().size());
+    for (const RkDemoBone& b : rkDemoBones()) {
+        const int i = bones.indexOf(b.name);
+        QVERIFY2(i >= 0, qPrintable(b.name));
+        const RkVec3 c = RkDemoMesh::jointCentre(i);
+        QVERIFY2((c - RkVec3(b.origin.x(), b.origin.y(), b.origin.z())).length() < 1e-4f,
+                 qPrintable(b.name));
+        const int parent = RkDemoMesh::boneParent(i);
+        QCOMPARE(parent < 0 ? QString() : bones[parent], b.parent);
+    }
+    for (const RkDemoMorph& m : rkDemoMorphs()) {
+        QCOMPARE(RkDemoMesh::morphRegion(m.name), m.region);
+        bool found = false;
+        for (const RkMorphDeltas& d : m_demo.morphs())
+            found = found || d.name == m.name;
+        QVERIFY2(found, qPrintable(m.name));
+    }
+    // Every bone's own mesh holds exactly its share of the figure's vertices.
+    int total = 0;
+    for (int b = 0; b < bones.size(); ++b) {
+        const auto mesh = m_demo.createBoneMesh(b);
+        QVERIFY2(mesh, qPrintable(bones[b]));
+        total += mesh->getNumVertices();
+        for (const RkMorphDeltas& d : m_demo.boneMorphs(b)) {
+            for (int v : d.indices)
+                QVERIFY(v >= 0 && v < mesh->getNumVertices());
+        }
+    }
+    QCOMPARE(total, m_demo.createFigureMesh()->getNumVertices());
+    QVERIFY(!m_demo.createBoneMesh(bones.size()));
 }
 
 QTEST_APPLESS_MAIN(TestRkDemoMesh)
