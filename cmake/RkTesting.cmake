@@ -12,6 +12,8 @@ function(rk_add_qtest name)
     add_executable(${name} ${T_SOURCES})
     target_link_libraries(${name} PRIVATE Qt5::Test rkcore ${T_LIBS})
     target_include_directories(${name} PRIVATE ${PROJECT_SOURCE_DIR}/tests/common)
+    file(MAKE_DIRECTORY ${RK_TEST_HOME}/${name}/config ${RK_TEST_HOME}/${name}/run)
+    file(CHMOD ${RK_TEST_HOME}/${name}/run DIRECTORY_PERMISSIONS OWNER_READ OWNER_WRITE OWNER_EXECUTE)
     add_test(NAME ${name} COMMAND ${name})
     set_tests_properties(${name} PROPERTIES
         TIMEOUT ${T_TIMEOUT}

@@ -1,10 +1,195 @@
+#include "rkaboutplugins.h"
+#include "rkactionmgr.h"
 #include "rkapp.h"
+#include "rkdemotools.h"
+#include "rkhostactions.h"
+#include "rkmainwindow.h"
+#include "rkpanemgr.h"
+#include "rkpluginmgr.h"
+#include "rkstyle.h"
+#include "rkviewportmgr.h"
 
 #include <QApplication>
+#include <QCommandLineParser>
+#include <QDir>
+#include <QFile>
+#include <QLinearGradient>
+#include <QMenu>
+#include <QPainter>
+#include <QScriptEngine>
+#include <QTimer>
+
+#include <cstdio>
+
+namespace {
+
+// Stands in for the 3D picture until a scene view is set.
+class PlaceholderSceneWidget : public QWidget {
+public:
+    explicit PlaceholderSceneWidget(QWidget* parent = nullptr) : QWidget(parent)
+    {
+        setObjectName(QStringLiteral("SceneView"));
+    }
+
+protected:
+    void paintEvent(QPaintEvent*) override
+    {
+        QPainter p(this);
+        QLinearGradient g(rect().topLeft(), rect().bottomLeft());
+        g.setColorAt(0, QColor(92, 100, 112));
+        g.setColorAt(1, QColor(36, 38, 44));
+        p.fillRect(rect(), g);
+        p.setPen(QColor(200, 200, 200));
+        p.drawText(rect(), Qt::AlignCenter, tr("Main Viewport"));
+    }
+};
+
+// --plugins, then $RK_PLUGIN_PATH, then the installed plug-in folder next to the binary, then the
+// build tree's.
+QString pluginFolder(const QCommandLineParser& parser)
+{
+    if (parser.isSet(QStringLiteral("plugins")))
+        return parser.value(QStringLiteral("plugins"));
+    const QString fromEnv = qEnvironmentVariable("RK_PLUGIN_PATH");
+    if (!fromEnv.isEmpty())
+        return fromEnv;
+    const QString installed = QDir(QCoreApplication::applicationDirPath())
+                                  .absoluteFilePath(QStringLiteral("../" RK_PLUGIN_INSTALL_DIR));
+    if (QDir(installed).exists())
+        return QDir::cleanPath(installed);
+    return QStringLiteral(RK_PLUGIN_BUILD_DIR);
+}
+
+bool hasDisplay()
+{
+    return !qEnvironmentVariableIsEmpty("DISPLAY") ||
+           !qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY") ||
+           !qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM");
+}
+
+bool wantsListOnly(int argc, char** argv)
+{
+    for (int i = 1; i < argc; ++i) {
+        const QByteArray arg(argv[i]);
+        if (arg == "--list-plugins" || arg == "--help" || arg == "-h" || arg == "--version" ||
+            arg == "-v")
+            return true;
+    }
+    return false;
+}
+
+int runScript(const QString& fileName)
+{
+    QFile file(fileName);
+    if (!file.open(QIODevice::ReadOnly)) {
+        std::fprintf(stderr, "rkhost: cannot read script %s: %s\n", qPrintable(fileName),
+                     qPrintable(file.errorString()));
+        return 1;
+    }
+    QScriptEngine* engine = rkApp->getScriptEngine();
+    engine->evaluate(QString::fromUtf8(file.readAll()), fileName);
+    if (engine->hasUncaughtException()) {
+        std::fprintf(stderr, "rkhost: %s:%d: %s\n", qPrintable(fileName),
+                     engine->uncaughtExceptionLineNumber(),
+                     qPrintable(engine->uncaughtException().toString()));
+        engine->clearExceptions();
+        return 1;
+    }
+    return 0;
+}
+
+} // namespace
 
 int main(int argc, char** argv)
 {
+    if (!hasDisplay()) {
+        if (wantsListOnly(argc, argv)) {
+            qputenv("QT_QPA_PLATFORM", "offscreen");
+        } else {
+            std::fprintf(stderr,
+                         "rkhost: no display. Run it under a virtual X server, for example:\n"
+                         "  xvfb-run -a -s '-screen 0 1600x1200x24' %s --screenshot host.png\n",
+                         argv[0]);
+            return 2;
+        }
+    }
+
     QApplication app(argc, argv);
+    QApplication::setApplicationName(QStringLiteral("rkhost"));
+    QApplication::setOrganizationName(QStringLiteral("rkhost"));
+    QApplication::setApplicationVersion(QStringLiteral("3.0.1"));
+
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        QStringLiteral("Host program: loads the modules of its plug-in folder and shows them."));
+    parser.addHelpOption();
+    parser.addVersionOption();
+    parser.addOptions({
+        {QStringLiteral("plugins"), QStringLiteral("Load modules from <dir>."),
+         QStringLiteral("dir")},
+        {QStringLiteral("list-plugins"), QStringLiteral("Print the loaded modules and exit.")},
+        {QStringLiteral("script"),
+         QStringLiteral("Run <file> with the host's script engine after start-up, then exit "
+                        "(non-zero on a script error)."),
+         QStringLiteral("file")},
+        {QStringLiteral("screenshot"),
+         QStringLiteral("Start, let the window settle, save it as PNG <file> and exit."),
+         QStringLiteral("file")},
+    });
+    parser.process(app);
+
     RkApp core;
-    return 0;
+    RkStyle::install();
+
+    const QString folder = pluginFolder(parser);
+    if (parser.isSet(QStringLiteral("list-plugins"))) {
+        core.getPluginMgr()->loadModules(folder);
+        std::fprintf(stdout, "plug-in folder: %s\n%s", qPrintable(folder),
+                     qPrintable(rkPluginListing(core.getPluginMgr())));
+        return 0;
+    }
+
+    RkMainWindow window;
+    window.setWindowTitle(QStringLiteral("rkhost"));
+    window.setSceneWidget(new PlaceholderSceneWidget);
+    window.addMenu(QStringLiteral("&File"));
+    window.addMenu(QStringLiteral("&Edit"));
+    window.addMenu(QStringLiteral("&View"));
+    window.addMenu(QStringLiteral("&Window"));
+    rkAddHostActions(&window);
+    rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());
+
+    core.getPluginMgr()->loadModules(folder);
+    window.getPaneMgr()->createPanes();
+    // Scripts reach the window's widgets by object name: mainWindow.findChild("RkToolPaneDock").
+    QScriptEngine* engine = core.getScriptEngine();
+    engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
+    window.getActionMgr()->buildMenus();
+    // Help stays the last menu.
+    window.addMenu(QStringLiteral("&Help"));
+    window.resize(1280, 800);
+    window.show();
+
+    const QString script = parser.value(QStringLiteral("script"));
+    const QString screenshot = parser.value(QStringLiteral("screenshot"));
+    QTimer::singleShot(0, &app, [&] {
+        core.setRunning(true);
+        if (!script.isEmpty()) {
+            const int rc = runScript(script);
+            if (rc != 0 || screenshot.isEmpty()) {
+                QCoreApplication::exit(rc);
+                return;
+            }
+        }
+        if (!screenshot.isEmpty()) {
+            // Give layouts, docks and posted refreshes time to settle before grabbing.
+            QTimer::singleShot(500, &app, [&] {
+                const bool saved = window.grab().save(screenshot, "PNG");
+                if (!saved)
+                    std::fprintf(stderr, "rkhost: cannot write %s\n", qPrintable(screenshot));
+                QCoreApplication::exit(saved ? 0 : 1);
+            });
+        }
+    });
+    return app.exec();
 }

@@ -1,12 +1,14 @@
 #include "rkcomponentsplugin.h"
 
-// The module's two entry points, under their plain names.
+class RkPlugin;
+
+// The module's two entry points, under their plain names; everything else stays hidden.
 extern "C" Q_DECL_EXPORT quint32 getSDKVersion()
 {
     return RK_SDK_VERSION;
 }
 
-extern "C" Q_DECL_EXPORT void* getPluginDefinition()
+extern "C" Q_DECL_EXPORT RkPlugin* getPluginDefinition()
 {
-    return nullptr;
+    return rkComponentsPlugin();
 }

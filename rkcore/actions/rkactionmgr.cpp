@@ -146,8 +146,16 @@ void RkActionMgr::buildMenus()
                 return ga < gb;
             return withoutMnemonic(a->text()).localeAwareCompare(withoutMnemonic(b->text())) < 0;
         });
+        // Plain entries go above the sub-menus of the same menu.
+        QAction* firstSubMenu = nullptr;
+        for (QAction* a : menu->actions()) {
+            if (a->menu()) {
+                firstSubMenu = a;
+                break;
+            }
+        }
         for (RkAction* action : list)
-            menu->addAction(action);
+            menu->insertAction(firstSubMenu, action);
     }
 }
 

@@ -1,0 +1,6 @@
+#include "rkassertcast.h"
+
+QString RkAssertCast::failureMessage()
+{
+    return tr("Failure to cast RkAssertCast");
+}

@@ -1,0 +1,11 @@
+#pragma once
+
+#include "rkpaneaction.h"
+
+// Shows and hides the Tool tab.
+class RkToolPaneAction : public RkPaneAction {
+    Q_OBJECT
+public:
+    RkToolPaneAction();
+    ~RkToolPaneAction() override;
+};

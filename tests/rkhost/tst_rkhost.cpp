@@ -1,0 +1,138 @@
+#include "rktestmain.h"
+
+#include <QImage>
+#include <QProcess>
+#include <QTemporaryDir>
+
+namespace {
+struct Run {
+    int exitCode = -1;
+    QString out;
+    QString err;
+};
+
+Run runHost(const QStringList& arguments, const QProcessEnvironment& env =
+                                               QProcessEnvironment::systemEnvironment())
+{
+    QProcess host;
+    host.setProcessEnvironment(env);
+    host.start(QStringLiteral(RK_HOST_BINARY), arguments);
+    Run run;
+    if (!host.waitForFinished(60000)) {
+        host.kill();
+        host.waitForFinished();
+        run.err = QStringLiteral("<timed out>");
+        return run;
+    }
+    run.exitCode = host.exitStatus() == QProcess::NormalExit ? host.exitCode() : -2;
+    run.out = QString::fromLocal8Bit(host.readAllStandardOutput());
+    run.err = QString::fromLocal8Bit(host.readAllStandardError());
+    return run;
+}
+
+QString writeScript(const QTemporaryDir& dir, const QString& name, const QString& text)
+{
+    const QString path = dir.filePath(name);
+    QFile file(path);
+    if (file.open(QIODevice::WriteOnly))
+        file.write(text.toUtf8());
+    return path;
+}
+} // namespace
+
+class TestRkHost : public QObject {
+    Q_OBJECT
+private Q_SLOTS:
+    void screenshotShowsTheDockedToolTab();
+    void scriptConstructsModuleClasses();
+    void scriptErrorExitsNonZero();
+    void listPlugins();
+    void refusedModulesLeaveTheHostRunning();
+    void noDisplaySaysWhatToDo();
+
+private:
+    QTemporaryDir m_dir;
+};
+
+void TestRkHost::screenshotShowsTheDockedToolTab()
+{
+    const QString png = m_dir.filePath(QStringLiteral("host.png"));
+    const Run run = runHost({QStringLiteral("--screenshot"), png});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QImage image(png);
+    QVERIFY(!image.isNull());
+    QVERIFY(image.width() >= 800 && image.height() >= 500);
+    // The viewport fills the left part with its dark picture; the Tool tab is docked on the
+    // right in the light window colour.
+    const int y = image.height() / 2;
+    QVERIFY(qGray(image.pixel(image.width() / 3, y)) < 128);
+    QVERIFY(qGray(image.pixel(image.width() - 40, y)) > 200);
+}
+
+void TestRkHost::scriptConstructsModuleClasses()
+{
+    const QString script = writeScript(m_dir, QStringLiteral("make.js"), QStringLiteral(R"(
+        var pane = new RkToolPane();
+        print("made", pane.windowTitle);
+        var dock = mainWindow.findChild("RkToolPaneDock");
+        print("dock", dock.visible, dock.windowTitle);
+        print("tool", dock.findChild("Tool Pane Name").text);
+    )"));
+    const Run run = runHost({QStringLiteral("--script"), script});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QCOMPARE(run.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts),
+             QStringList({"made Tool", "dock true Tool", "tool Universal"}));
+}
+
+void TestRkHost::scriptErrorExitsNonZero()
+{
+    const QString script = writeScript(m_dir, QStringLiteral("broken.js"),
+                                       QStringLiteral("print('before');\nnoSuchFunction();\n"));
+    const Run run = runHost({QStringLiteral("--script"), script});
+    QCOMPARE(run.exitCode, 1);
+    QCOMPARE(run.out, QStringLiteral("before\n"));
+    QVERIFY2(run.err.contains(QStringLiteral("broken.js:2: ReferenceError")), qPrintable(run.err));
+}
+
+void TestRkHost::listPlugins()
+{
+    const Run run = runHost({QStringLiteral("--list-plugins")});
+    QCOMPARE(run.exitCode, 0);
+    QVERIFY(run.out.contains(QStringLiteral("Interface Components\n")));
+    QVERIFY(run.out.contains(QStringLiteral("author: Morvane 3D, Inc")));
+    QVERIFY(run.out.contains(QStringLiteral("version: 2.0.8.32")));
+    QVERIFY(run.out.contains(QStringLiteral("RkToolPane 56C51F21-B8D3-4895-9E00-6C8975018A22")));
+    QVERIFY(run.out.contains(QStringLiteral("RkFullScreenAction 8A77FD58-BE3E-4434-93EF-BB41DA6DBDB4")));
+}
+
+void TestRkHost::refusedModulesLeaveTheHostRunning()
+{
+    // The option wins over the environment's plug-in folder.
+    const QString png = m_dir.filePath(QStringLiteral("refused.png"));
+    const Run run = runHost({QStringLiteral("--plugins"), QStringLiteral(RK_FIXTURE_DIR),
+                             QStringLiteral("--screenshot"), png});
+    QCOMPARE(run.exitCode, 0);
+    QVERIFY(QImage(png).width() > 0);
+    const QStringList lines = run.err.split(QLatin1Char('\n'));
+    QCOMPARE(lines.filter(QStringLiteral("rk_fixture_badsdk.so refused")).size(), 1);
+    QCOMPARE(lines.filter(QStringLiteral("rk_fixture_noentry.so refused")).size(), 1);
+}
+
+void TestRkHost::noDisplaySaysWhatToDo()
+{
+    QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+    env.remove(QStringLiteral("DISPLAY"));
+    env.remove(QStringLiteral("WAYLAND_DISPLAY"));
+    env.remove(QStringLiteral("QT_QPA_PLATFORM"));
+    const Run run = runHost({}, env);
+    QCOMPARE(run.exitCode, 2);
+    QVERIFY2(run.err.contains(QStringLiteral("xvfb-run")), qPrintable(run.err));
+    QVERIFY(run.err.contains(QStringLiteral("--screenshot")));
+    // Listing needs no display.
+    const Run list = runHost({QStringLiteral("--list-plugins")}, env);
+    QCOMPARE(list.exitCode, 0);
+    QVERIFY(list.out.contains(QStringLiteral("Interface Components")));
+}
+
+RK_TEST_MAIN(TestRkHost)
+#include "tst_rkhost.moc"
