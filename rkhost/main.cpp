@@ -9,6 +9,8 @@
 #include "rkpanemgr.h"
 #include "rkpluginmgr.h"
 #include "rkscene.h"
+#include "rkscenelist.h"
+#include "rkscenemenus.h"
 #include "rkstyle.h"
 #include "rkviewportmgr.h"
 
@@ -132,16 +134,17 @@ int main(int argc, char** argv)
 
     RkMainWindow window;
     window.setWindowTitle(QStringLiteral("rkhost"));
-    // The host starts with the demo scene, shown in the 3D viewport framed on the whole scene.
+    // The scene is shown in the 3D viewport, framed on the whole scene at start.
     auto* sceneView = new Rk3DViewport;
     sceneView->setObjectName(QStringLiteral("SceneView"));
     window.setSceneWidget(sceneView);
-    if (rkScene->getNumNodes() == 0)
-        rkBuildDemoScene(rkScene);
     window.addMenu(QStringLiteral("&File"));
     window.addMenu(QStringLiteral("&Edit"));
     window.addMenu(QStringLiteral("&View"));
     window.addMenu(QStringLiteral("&Window"));
+    new RkSceneMenus(&window);
+    rkAddSceneList(&window);
+    rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
     rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());
 

@@ -82,6 +82,9 @@ void RkActionMgr::adopt(RkAction* action)
 {
     // Parented to the main window so that shortcuts work wherever focus is in it.
     action->setParent(d->mainWindow);
+    // Scripts and tests find an action by its class name.
+    if (action->objectName().isEmpty())
+        action->setObjectName(QString::fromLatin1(action->metaObject()->className()));
     if (action->shortcut().isEmpty() && !action->getDefaultAccel().isEmpty())
         action->setShortcut(action->getDefaultAccel());
     d->actions.insert(QString::fromLatin1(action->metaObject()->className()), action);

@@ -1,5 +1,6 @@
 #include "rkmainwindow.h"
 
+#include "rkaction.h"
 #include "rkactionmgr.h"
 #include "rkapp.h"
 #include "rkpanemgr.h"
@@ -159,4 +160,13 @@ void RkMainWindow::closeEvent(QCloseEvent* event)
 {
     d->paneMgr->saveSettings();
     QMainWindow::closeEvent(event);
+}
+
+void RkMainWindow::changeEvent(QEvent* event)
+{
+    QMainWindow::changeEvent(event);
+    if (event->type() == QEvent::StyleChange) {
+        for (RkAction* action : d->actionMgr->getActions())
+            action->styleChange();
+    }
 }

@@ -45,6 +45,8 @@ Q_SIGNALS:
 
 protected:
     void closeEvent(QCloseEvent* event) override;
+    // Tells every action of the action manager when the style changes, so icons follow it.
+    void changeEvent(QEvent* event) override;
 
 private:
     struct Private;

@@ -34,10 +34,10 @@ RKCORE_EXPORT const QVector<RkDemoBone>& rkDemoBones();
 RKCORE_EXPORT const QVector<RkDemoMorph>& rkDemoMorphs();
 
 // Object names and sources of the demo nodes.
-RKCORE_EXPORT extern const char* const RkDemoFigureName;  // "Figure"
-RKCORE_EXPORT extern const char* const RkDemoPropName;    // "Prop"
-RKCORE_EXPORT extern const char* const RkDemoCameraName;  // "Camera"
-RKCORE_EXPORT extern const char* const RkDemoLightName;   // "Light"
+RKCORE_EXPORT extern const char* const RkDemoFigureName;   // "Figure"
+RKCORE_EXPORT extern const char* const RkDemoPropName;     // "Prop"
+RKCORE_EXPORT extern const char* const RkDemoCameraName;   // "Camera"
+RKCORE_EXPORT extern const char* const RkDemoLightName;    // "Light"
 RKCORE_EXPORT extern const char* const RkDemoFigureSource; // "demo:figure"
 RKCORE_EXPORT extern const char* const RkDemoPropSource;   // "demo:prop"
 

@@ -16,7 +16,8 @@
 
 #include <cstring>
 
-namespace RkFileFormat {
+namespace RkFileFormat
+{
 
 constexpr char Magic[8] = {'R', 'K', 'S', 'C', 'E', 'N', 'E', '\x1a'};
 constexpr quint32 Version = 1;
@@ -41,14 +42,22 @@ enum PointerKind : quint8 {
 inline const char* tagName(quint8 tag)
 {
     switch (tag) {
-    case TagInt: return "an int";
-    case TagFloat: return "a float";
-    case TagDouble: return "a double";
-    case TagBool: return "a bool";
-    case TagString: return "a string";
-    case TagBytes: return "a byte array";
-    case TagPointer: return "a pointer";
-    default: return "an unknown value";
+    case TagInt:
+        return "an int";
+    case TagFloat:
+        return "a float";
+    case TagDouble:
+        return "a double";
+    case TagBool:
+        return "a bool";
+    case TagString:
+        return "a string";
+    case TagBytes:
+        return "a byte array";
+    case TagPointer:
+        return "a pointer";
+    default:
+        return "an unknown value";
     }
 }
 

@@ -36,9 +36,9 @@ bool RkInFile::Private::readTag(RkInFile* file, quint8 expected)
         return false;
     const quint8 tag = quint8(data.at(pos));
     if (tag != expected) {
-        file->setError(QStringLiteral("%1 holds %2 where %3 belongs")
-                           .arg(where(), QLatin1String(tagName(tag)),
-                               QLatin1String(tagName(expected))));
+        file->setError(
+            QStringLiteral("%1 holds %2 where %3 belongs")
+                .arg(where(), QLatin1String(tagName(tag)), QLatin1String(tagName(expected))));
         return false;
     }
     pos++;
@@ -174,9 +174,8 @@ int RkInFile::readPointer()
         break;
     }
     default:
-        setError(QStringLiteral("%1 holds a pointer of unknown kind %2")
-                     .arg(d->where())
-                     .arg(ref.kind));
+        setError(
+            QStringLiteral("%1 holds a pointer of unknown kind %2").arg(d->where()).arg(ref.kind));
         return -1;
     }
     d->refs.append(ref);

@@ -12,7 +12,8 @@ class RkBase;
 // What a stored object reads its sections from (RkBase::loadSection). Every read stays inside
 // the current section and checks the type of the stored value; a read that fails sets the
 // file's error, which fails the whole load, and leaves the target untouched.
-class RKCORE_EXPORT RkInFile {
+class RKCORE_EXPORT RkInFile
+{
 public:
     ~RkInFile();
     RkInFile(const RkInFile&) = delete;

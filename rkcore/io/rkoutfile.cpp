@@ -14,8 +14,8 @@ RkOutFile::~RkOutFile() = default;
 void RkOutFile::startSection(short id)
 {
     if (d->inSection) {
-        setError(QStringLiteral("section 0x%1 started inside another section")
-                     .arg(quint16(id), 0, 16));
+        setError(
+            QStringLiteral("section 0x%1 started inside another section").arg(quint16(id), 0, 16));
         return;
     }
     d->inSection = true;

@@ -13,7 +13,8 @@ class RkBase;
 // values under a 16-bit id; sections do not nest. A pointer refers to another object of the
 // file: a node of the scene, a property of such a node, or any other RkBase, which is then
 // stored too (it belongs to the object that points at it).
-class RKCORE_EXPORT RkOutFile {
+class RKCORE_EXPORT RkOutFile
+{
 public:
     ~RkOutFile();
     RkOutFile(const RkOutFile&) = delete;

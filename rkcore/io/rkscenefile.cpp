@@ -17,7 +17,8 @@
 
 using namespace RkFileFormat;
 
-namespace {
+namespace
+{
 
 void setError(QString* error, const QString& message)
 {
@@ -124,8 +125,9 @@ QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
         if (out.d->inSection)
             out.setError(QStringLiteral("%1 left a section open").arg(describe(object)));
         if (out.hasError()) {
-            setError(error, QStringLiteral("Saving %1 failed: %2")
-                                .arg(describe(object), out.errorString()));
+            setError(
+                error,
+                QStringLiteral("Saving %1 failed: %2").arg(describe(object), out.errorString()));
             return QByteArray();
         }
         QByteArray record;
@@ -227,15 +229,14 @@ bool RkSceneReader::Private::parse(QVector<Record>& records)
                         .arg(available)
                         .arg(bodyLength));
     if (bodyLength < available)
-        return fail(QStringLiteral("the file has %1 bytes after its end")
-                        .arg(available - bodyLength));
+        return fail(
+            QStringLiteral("the file has %1 bytes after its end").arg(available - bodyLength));
     if (verifyChecksum && crc32(p + HeaderSize, int(bodyLength)) != crc)
         return fail(QStringLiteral("the file is damaged: its checksum does not match"));
     // Every record takes at least 20 bytes, which bounds the count before anything is
     // allocated for it.
     if (count > bodyLength / 20 + 1)
-        return fail(QStringLiteral("the file claims %1 objects, more than it can hold")
-                        .arg(count));
+        return fail(QStringLiteral("the file claims %1 objects, more than it can hold").arg(count));
 
     int pos = HeaderSize;
     const int fileEnd = data.size();
@@ -260,8 +261,8 @@ bool RkSceneReader::Private::parse(QVector<Record>& records)
         const int end = pos + int(length);
         Record record;
         quint32 sectionCount = 0;
-        if (!readString(end, record.guid) || !readString(end, record.className)
-            || !readString(end, record.name) || end - pos < 4)
+        if (!readString(end, record.guid) || !readString(end, record.className) ||
+            !readString(end, record.name) || end - pos < 4)
             return fail(QStringLiteral("the header of object %1 is broken").arg(i));
         sectionCount = get<quint32>(p + pos);
         pos += 4;
@@ -393,8 +394,8 @@ bool RkSceneReader::Private::resolvePointers()
             if (ref.target == ref.owner)
                 return fail(QStringLiteral("%1 refers to its own object").arg(where));
             if (referenced[size_t(ref.target)]++ > 0)
-                return fail(QStringLiteral("object %1 is pointed at more than once")
-                                .arg(ref.target));
+                return fail(
+                    QStringLiteral("object %1 is pointed at more than once").arg(ref.target));
         }
         try {
             owner->setPointer(&file, ref.section, ref.index, target);

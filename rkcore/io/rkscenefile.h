@@ -9,7 +9,8 @@
 
 // Writes the scene file of a list of nodes: every node, its properties' definitions, values
 // and flags, its data items and every object they point at.
-class RKCORE_EXPORT RkSceneWriter {
+class RKCORE_EXPORT RkSceneWriter
+{
 public:
     static QByteArray write(const RkNodeList& nodes, QString* error = nullptr);
     static bool writeFile(const RkNodeList& nodes, const QString& path, QString* error = nullptr);
@@ -18,7 +19,8 @@ public:
 // Reads a scene file into new objects without touching the scene. Until takeNodes() the reader
 // owns what it made, and deletes all of it when it is destroyed, so a failed read leaks
 // nothing and changes nothing.
-class RKCORE_EXPORT RkSceneReader {
+class RKCORE_EXPORT RkSceneReader
+{
 public:
     RkSceneReader();
     ~RkSceneReader();

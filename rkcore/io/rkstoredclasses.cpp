@@ -1,13 +1,16 @@
 #include "rkstoredclasses.h"
 
+#include "rkapp.h"
 #include "rkbone.h"
 #include "rkcamera.h"
+#include "rkclassfactory.h"
 #include "rklight.h"
 #include "rkskeleton.h"
 
 #include <QHash>
 
-namespace {
+namespace
+{
 
 struct StoredClass {
     QString guid;
@@ -31,15 +34,15 @@ Registry& registry()
     static Registry r = [] {
         Registry core;
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a01"), &RkNode::staticMetaObject,
-            [] { return new RkNode; });
+                 [] { return new RkNode; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a02"),
-            &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
+                 &RkSkeleton::staticMetaObject, [] { return new RkSkeleton; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a03"), &RkBone::staticMetaObject,
-            [] { return new RkBone; });
+                 [] { return new RkBone; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a04"),
-            &RkCamera::staticMetaObject, [] { return new RkCamera; });
+                 &RkCamera::staticMetaObject, [] { return new RkCamera; });
         core.add(QStringLiteral("7d2b8f10-3c41-4e8a-9a51-0f6c2d7e1a05"), &RkLight::staticMetaObject,
-            [] { return new RkLight; });
+                 [] { return new RkLight; });
         return core;
     }();
     return r;
@@ -48,7 +51,7 @@ Registry& registry()
 } // namespace
 
 void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
-    std::function<RkBase*()> create)
+                           std::function<RkBase*()> create)
 {
     if (guid.isEmpty() || !metaObject || !create)
         return;
@@ -57,16 +60,35 @@ void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
 
 QString rkStoredClassGuid(const QString& className)
 {
-    return registry().guidByClass.value(className);
+    const QString guid = registry().guidByClass.value(className);
+    if (!guid.isEmpty())
+        return guid;
+    if (RkClassFactory* factory = RkApp::findClassFactory(className))
+        return factory->getGUID().toString();
+    return QString();
 }
 
 RkBase* rkCreateStoredObject(const QString& guid, QString* error)
 {
     const auto it = registry().byGuid.constFind(guid.toLower());
     if (it == registry().byGuid.constEnd()) {
-        if (error)
-            *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
-        return nullptr;
+        // Classes of modules come from their class factories.
+        const RkGUID id = RkGUID::fromString(guid);
+        RkClassFactory* factory = id.isNull() ? nullptr : RkApp::findClassFactory(id);
+        if (!factory) {
+            if (error)
+                *error = QStringLiteral("no class is known by the GUID %1").arg(guid);
+            return nullptr;
+        }
+        QObject* made = factory->createInstance();
+        auto* object = qobject_cast<RkBase*>(made);
+        if (!object) {
+            delete made;
+            if (error)
+                *error = QStringLiteral("%1 (GUID %2) is not a class that a scene can store")
+                             .arg(factory->className(), guid);
+        }
+        return object;
     }
     RkBase* object = it->create();
     if (!object && error)

@@ -13,7 +13,7 @@ struct QMetaObject;
 // again through the class factory of that GUID. Core classes register here; classes of modules
 // are found through the application's class factories.
 RKCORE_EXPORT void rkRegisterStoredClass(const QString& guid, const QMetaObject* metaObject,
-    std::function<RkBase*()> create);
+                                         std::function<RkBase*()> create);
 // The GUID under which the object's class is stored, or an empty string.
 RKCORE_EXPORT QString rkStoredClassGuid(const QString& className);
 // A new object of the class with that GUID, or null with *error set.

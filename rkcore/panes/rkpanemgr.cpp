@@ -38,6 +38,8 @@ QWidget* makeTitleBar(QDockWidget* dock, RkPane* pane)
     options->setAutoRaise(true);
     options->setPopupMode(QToolButton::InstantPopup);
     options->setArrowType(Qt::DownArrow);
+    // The arrow already says "menu"; the style's extra indicator would only crowd the title bar.
+    options->setStyleSheet(QStringLiteral("QToolButton::menu-indicator { image: none; }"));
     auto* menu = new QMenu(options);
     menu->setObjectName(QStringLiteral("PaneOptionsMenu"));
     QPointer<RkPane> watched(pane);

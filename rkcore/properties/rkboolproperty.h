@@ -3,7 +3,8 @@
 #include "rkproperty.h"
 
 // An on/off property.
-class RKCORE_EXPORT RkBoolProperty : public RkProperty {
+class RKCORE_EXPORT RkBoolProperty : public RkProperty
+{
     Q_OBJECT
 public:
     RkBoolProperty(const QString& name, const QString& label, QObject* parent = nullptr);

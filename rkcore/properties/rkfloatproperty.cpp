@@ -139,13 +139,13 @@ void RkFloatProperty::loadState(RkInFile* file)
 {
     float value = 0, def = 0, min = 0, max = 0, sensitivity = 0;
     bool clamped = false, percent = false;
-    if (!file->readFloat(value) || !file->readFloat(def) || !file->readFloat(min)
-        || !file->readFloat(max) || !file->readFloat(sensitivity) || !file->readBool(clamped)
-        || !file->readBool(percent))
+    if (!file->readFloat(value) || !file->readFloat(def) || !file->readFloat(min) ||
+        !file->readFloat(max) || !file->readFloat(sensitivity) || !file->readBool(clamped) ||
+        !file->readBool(percent))
         return;
     if (min > max) {
-        file->setError(QStringLiteral("property \"%1\" has a minimum above its maximum")
-                           .arg(getName()));
+        file->setError(
+            QStringLiteral("property \"%1\" has a minimum above its maximum").arg(getName()));
         return;
     }
     setMinMax(min, max);

@@ -5,7 +5,8 @@
 // A float property. setValue() stores any finite value as given; adjustValue() clamps it to
 // [min, max] first when the property is clamped. A value that is not a finite number is
 // refused: the property keeps its value and the refusal is logged.
-class RKCORE_EXPORT RkFloatProperty : public RkNumericProperty {
+class RKCORE_EXPORT RkFloatProperty : public RkNumericProperty
+{
     Q_OBJECT
 public:
     RkFloatProperty(const QString& name, const QString& label, QObject* parent = nullptr);

@@ -102,12 +102,12 @@ void RkIntProperty::loadState(RkInFile* file)
 {
     int value = 0, def = 0, min = 0, max = 0;
     bool clamped = false;
-    if (!file->readInt(value) || !file->readInt(def) || !file->readInt(min)
-        || !file->readInt(max) || !file->readBool(clamped))
+    if (!file->readInt(value) || !file->readInt(def) || !file->readInt(min) ||
+        !file->readInt(max) || !file->readBool(clamped))
         return;
     if (min > max) {
-        file->setError(QStringLiteral("property \"%1\" has a minimum above its maximum")
-                           .arg(getName()));
+        file->setError(
+            QStringLiteral("property \"%1\" has a minimum above its maximum").arg(getName()));
         return;
     }
     setMinMax(min, max);

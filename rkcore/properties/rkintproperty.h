@@ -3,7 +3,8 @@
 #include "rknumericproperty.h"
 
 // An integer property; adjustValue() clamps to [min, max] when the property is clamped.
-class RKCORE_EXPORT RkIntProperty : public RkNumericProperty {
+class RKCORE_EXPORT RkIntProperty : public RkNumericProperty
+{
     Q_OBJECT
 public:
     RkIntProperty(const QString& name, const QString& label, QObject* parent = nullptr);

@@ -3,7 +3,8 @@
 #include "rkproperty.h"
 
 // A property with a number as value; a clamped one keeps adjusted values within its limits.
-class RKCORE_EXPORT RkNumericProperty : public RkProperty {
+class RKCORE_EXPORT RkNumericProperty : public RkProperty
+{
     Q_OBJECT
 public:
     RkNumericProperty(const QString& name, const QString& label, QObject* parent = nullptr);

@@ -141,8 +141,8 @@ bool RkProperty::setValueVariant(const QVariant&)
 
 int RkProperty::getFlags() const
 {
-    return (d->hidden ? Hidden : 0) | (d->favorite ? Favorite : 0)
-        | (d->globalFavorite ? GlobalFavorite : 0);
+    return (d->hidden ? Hidden : 0) | (d->favorite ? Favorite : 0) |
+           (d->globalFavorite ? GlobalFavorite : 0);
 }
 
 void RkProperty::setFlags(int flags)

@@ -10,7 +10,8 @@ class RkElement;
 
 // A named value of a scene element, shown to the user under its label in the group its path
 // names. Every value change made while an undo hold is open is recorded on rkUndoStack.
-class RKCORE_EXPORT RkProperty : public RkBase {
+class RKCORE_EXPORT RkProperty : public RkBase
+{
     Q_OBJECT
 public:
     RkProperty(const QString& name, const QString& label, QObject* parent = nullptr);

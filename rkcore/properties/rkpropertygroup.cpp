@@ -2,12 +2,10 @@
 
 #include "rkpropertygrouptree.h"
 
-RkPropertyGroup::RkPropertyGroup(
-    const QString& name, RkPropertyGroup* parentGroup, RkPropertyGroupTree* tree)
-    : QObject(parentGroup ? static_cast<QObject*>(parentGroup) : tree),
-      m_name(name),
-      m_parentGroup(parentGroup),
-      m_tree(tree)
+RkPropertyGroup::RkPropertyGroup(const QString& name, RkPropertyGroup* parentGroup,
+                                 RkPropertyGroupTree* tree)
+    : QObject(parentGroup ? static_cast<QObject*>(parentGroup) : tree), m_name(name),
+      m_parentGroup(parentGroup), m_tree(tree)
 {
 }
 
@@ -35,8 +33,8 @@ RkPropertyGroup* RkPropertyGroup::getFirstChild() const
 
 RkPropertyGroup* RkPropertyGroup::getNextSibling() const
 {
-    const QList<RkPropertyGroup*>& siblings = m_parentGroup ? m_parentGroup->m_children
-                                                            : m_tree->m_top;
+    const QList<RkPropertyGroup*>& siblings =
+        m_parentGroup ? m_parentGroup->m_children : m_tree->m_top;
     const int i = siblings.indexOf(const_cast<RkPropertyGroup*>(this));
     return i >= 0 ? siblings.value(i + 1) : nullptr;
 }

@@ -10,7 +10,8 @@ class RkPropertyGroupTree;
 
 // One level of an element's property groups: a name, the properties filed directly under it
 // and its sub-groups. The path joins the names from the top with "/".
-class RKCORE_EXPORT RkPropertyGroup : public QObject {
+class RKCORE_EXPORT RkPropertyGroup : public QObject
+{
     Q_OBJECT
 public:
     ~RkPropertyGroup() override;

@@ -3,7 +3,8 @@
 #include "rkproperty.h"
 #include "rkpropertygroup.h"
 
-namespace {
+namespace
+{
 
 QStringList splitPath(const QString& path)
 {

@@ -10,7 +10,8 @@ class RkPropertyGroup;
 
 // The property groups of one element. The tree owns its groups, not the properties: a property
 // deleted elsewhere leaves its group by itself, and a group left empty is removed.
-class RKCORE_EXPORT RkPropertyGroupTree : public QObject {
+class RKCORE_EXPORT RkPropertyGroupTree : public QObject
+{
     Q_OBJECT
 public:
     explicit RkPropertyGroupTree(QObject* parent = nullptr);

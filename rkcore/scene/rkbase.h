@@ -11,7 +11,8 @@ class RkOutFile;
 // when reading, creates it through its class factory and hands it the stored sections:
 // startLoad(), loadSection() once per section, finishLoad(), then setPointer() once for every
 // stored pointer it read, in stored order, and finally postLoadFile() once the load is complete.
-class RKCORE_EXPORT RkBase : public QObject {
+class RKCORE_EXPORT RkBase : public QObject
+{
     Q_OBJECT
 public:
     explicit RkBase(QObject* parent = nullptr, const QString& name = QString());

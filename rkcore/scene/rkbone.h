@@ -3,7 +3,8 @@
 #include "rknode.h"
 
 // A bone of a figure; its figure is the nearest skeleton above it.
-class RKCORE_EXPORT RkBone : public RkNode {
+class RKCORE_EXPORT RkBone : public RkNode
+{
     Q_OBJECT
 public:
     explicit RkBone(QObject* parent = nullptr);

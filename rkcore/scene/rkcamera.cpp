@@ -25,7 +25,7 @@ RkFloatProperty* RkCamera::getFieldOfView() const
 QVector3D RkCamera::getPosition() const
 {
     return QVector3D(getXTranslate()->getValue(), getYTranslate()->getValue(),
-        getZTranslate()->getValue());
+                     getZTranslate()->getValue());
 }
 
 void RkCamera::setPosition(const QVector3D& position)

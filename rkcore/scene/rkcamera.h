@@ -4,7 +4,8 @@
 
 // A camera. It looks down its local -Z axis from its translation; "Field of View" is the
 // vertical opening angle in degrees.
-class RKCORE_EXPORT RkCamera : public RkNode {
+class RKCORE_EXPORT RkCamera : public RkNode
+{
     Q_OBJECT
 public:
     explicit RkCamera(QObject* parent = nullptr);

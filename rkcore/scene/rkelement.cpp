@@ -6,7 +6,8 @@
 
 #include <QPointer>
 
-namespace {
+namespace
+{
 
 // Drops a destroyed object from a list by address only: by the time destroyed() arrives the
 // object is no longer of its own class.
@@ -78,9 +79,8 @@ void RkElement::addProperty(RkProperty* property, const QString& groupPath)
     if (!d->properties.contains(property)) {
         property->setParent(this);
         d->properties.append(property);
-        connect(property, &QObject::destroyed, this, [this](QObject* object) {
-            dropDestroyed(d->properties, object);
-        });
+        connect(property, &QObject::destroyed, this,
+                [this](QObject* object) { dropDestroyed(d->properties, object); });
     }
     d->groups->addProperty(property, groupPath);
 }
@@ -130,9 +130,8 @@ void RkElement::addDataItem(RkElementData* item)
         previous->takeDataItem(item);
     item->setParent(this);
     d->dataItems.append(item);
-    connect(item, &QObject::destroyed, this, [this](QObject* object) {
-        dropDestroyed(d->dataItems, object);
-    });
+    connect(item, &QObject::destroyed, this,
+            [this](QObject* object) { dropDestroyed(d->dataItems, object); });
 }
 
 RkElementData* RkElement::findDataItem(const QString& name) const

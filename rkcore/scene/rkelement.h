@@ -11,7 +11,8 @@ class RkProperty;
 class RkPropertyGroupTree;
 
 // Something of the scene that has a label, properties in groups and attached data items.
-class RKCORE_EXPORT RkElement : public RkBase {
+class RKCORE_EXPORT RkElement : public RkBase
+{
     Q_OBJECT
 public:
     explicit RkElement(QObject* parent = nullptr, const QString& name = QString());

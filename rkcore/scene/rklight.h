@@ -5,7 +5,8 @@
 #include <QColor>
 
 // A distant light shining along its local -Z axis.
-class RKCORE_EXPORT RkLight : public RkNode {
+class RKCORE_EXPORT RkLight : public RkNode
+{
     Q_OBJECT
 public:
     explicit RkLight(QObject* parent = nullptr);

@@ -13,7 +13,8 @@
 
 #include <QPointer>
 
-namespace {
+namespace
+{
 
 enum NodeSection : short {
     SectionInfo = 0x0101,
@@ -23,7 +24,7 @@ enum NodeSection : short {
 };
 
 RkFloatProperty* makeFloat(RkNode* node, const QString& name, const QString& path, float min,
-    float max, float value, float sensitivity)
+                           float max, float value, float sensitivity)
 {
     auto* p = new RkFloatProperty(name, name);
     p->setMinMax(min, max);
@@ -69,8 +70,8 @@ RkNode::RkNode(QObject* parent) : RkElement(parent), d(std::make_unique<Private>
     d->xRot = makeFloat(this, QStringLiteral("XRotate"), rotation, -180, 180, 0, 1.0f);
     d->yRot = makeFloat(this, QStringLiteral("YRotate"), rotation, -180, 180, 0, 1.0f);
     d->zRot = makeFloat(this, QStringLiteral("ZRotate"), rotation, -180, 180, 0, 1.0f);
-    d->scale = makeFloat(this, QStringLiteral("Scale"), QStringLiteral("Transforms/Scale"), 0,
-        100, 1, 0.01f);
+    d->scale = makeFloat(this, QStringLiteral("Scale"), QStringLiteral("Transforms/Scale"), 0, 100,
+                         1, 0.01f);
     d->scale->setDisplayAsPercent(true);
     d->xTrans->setLabel(QStringLiteral("X Translate"));
     d->yTrans->setLabel(QStringLiteral("Y Translate"));
@@ -78,8 +79,8 @@ RkNode::RkNode(QObject* parent) : RkElement(parent), d(std::make_unique<Private>
     d->xRot->setLabel(QStringLiteral("X Rotate"));
     d->yRot->setLabel(QStringLiteral("Y Rotate"));
     d->zRot->setLabel(QStringLiteral("Z Rotate"));
-    for (RkFloatProperty* p : {d->xTrans, d->yTrans, d->zTrans, d->xRot, d->yRot, d->zRot,
-             d->scale}) {
+    for (RkFloatProperty* p :
+         {d->xTrans, d->yTrans, d->zTrans, d->xRot, d->yRot, d->zRot, d->scale}) {
         connect(p, &RkProperty::currentValueChanged, this, &RkNode::emitTransformChanged);
     }
     d->visible = new RkBoolProperty(QStringLiteral("Visible"), QStringLiteral("Visible"));
@@ -207,14 +208,38 @@ bool RkNode::isVisible() const
     return !d->visible || d->visible->getValue();
 }
 
-RkFloatProperty* RkNode::getXTranslate() const { return d->xTrans; }
-RkFloatProperty* RkNode::getYTranslate() const { return d->yTrans; }
-RkFloatProperty* RkNode::getZTranslate() const { return d->zTrans; }
-RkFloatProperty* RkNode::getXRotate() const { return d->xRot; }
-RkFloatProperty* RkNode::getYRotate() const { return d->yRot; }
-RkFloatProperty* RkNode::getZRotate() const { return d->zRot; }
-RkFloatProperty* RkNode::getScale() const { return d->scale; }
-RkBoolProperty* RkNode::getVisible() const { return d->visible; }
+RkFloatProperty* RkNode::getXTranslate() const
+{
+    return d->xTrans;
+}
+RkFloatProperty* RkNode::getYTranslate() const
+{
+    return d->yTrans;
+}
+RkFloatProperty* RkNode::getZTranslate() const
+{
+    return d->zTrans;
+}
+RkFloatProperty* RkNode::getXRotate() const
+{
+    return d->xRot;
+}
+RkFloatProperty* RkNode::getYRotate() const
+{
+    return d->yRot;
+}
+RkFloatProperty* RkNode::getZRotate() const
+{
+    return d->zRot;
+}
+RkFloatProperty* RkNode::getScale() const
+{
+    return d->scale;
+}
+RkBoolProperty* RkNode::getVisible() const
+{
+    return d->visible;
+}
 
 QString RkNode::getSource() const
 {
@@ -271,8 +296,8 @@ void RkNode::loadSection(RkInFile* file, short sectionId)
     case SectionInfo: {
         QString label, source;
         float x = 0, y = 0, z = 0;
-        if (file->readString(label) && file->readString(source) && file->readFloat(x)
-            && file->readFloat(y) && file->readFloat(z)) {
+        if (file->readString(label) && file->readString(source) && file->readFloat(x) &&
+            file->readFloat(y) && file->readFloat(z)) {
             setLabel(label);
             d->source = source;
             d->origin = QVector3D(x, y, z);
@@ -285,8 +310,8 @@ void RkNode::loadSection(RkInFile* file, short sectionId)
     case SectionProperty: {
         QString cls, name, label, path;
         int flags = 0;
-        if (!file->readString(cls) || !file->readString(name) || !file->readString(label)
-            || !file->readString(path) || !file->readInt(flags))
+        if (!file->readString(cls) || !file->readString(name) || !file->readString(label) ||
+            !file->readString(path) || !file->readInt(flags))
             return;
         if (name.isEmpty()) {
             file->setError(QStringLiteral("a property of node \"%1\" has no name").arg(getName()));

@@ -15,7 +15,8 @@ class RkSkeleton;
 // properties "XTranslate", "YTranslate", "ZTranslate" (group "Transforms/Translation"),
 // "XRotate", "YRotate", "ZRotate" in degrees (group "Transforms/Rotation"), "Scale" (group
 // "Transforms/Scale") and "Visible" (group "General").
-class RKCORE_EXPORT RkNode : public RkElement {
+class RKCORE_EXPORT RkNode : public RkElement
+{
     Q_OBJECT
 public:
     explicit RkNode(QObject* parent = nullptr);

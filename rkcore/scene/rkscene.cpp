@@ -7,7 +7,8 @@
 
 RkScene* rkScene = nullptr;
 
-namespace {
+namespace
+{
 
 QHash<QString, RkScene::SourceBuilder>& sourceBuilders()
 {

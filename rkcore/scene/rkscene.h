@@ -13,7 +13,8 @@
 // nodeRemoved() and then destroyed) and emits sceneCleared(); a load that succeeds clears the
 // scene that way and then emits sceneLoadStarting(), adds the loaded nodes and emits
 // sceneLoaded(). A load that fails changes nothing and emits nothing.
-class RKCORE_EXPORT RkScene : public QObject {
+class RKCORE_EXPORT RkScene : public QObject
+{
     Q_OBJECT
 public:
     explicit RkScene(QObject* parent = nullptr);

@@ -5,7 +5,8 @@
 class RkBone;
 
 // A figure: the root of a bone hierarchy.
-class RKCORE_EXPORT RkSkeleton : public RkNode {
+class RKCORE_EXPORT RkSkeleton : public RkNode
+{
     Q_OBJECT
 public:
     explicit RkSkeleton(QObject* parent = nullptr);

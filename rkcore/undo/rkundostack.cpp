@@ -7,7 +7,8 @@
 
 RkUndoStack* rkUndoStack = nullptr;
 
-namespace {
+namespace
+{
 
 struct Change {
     QPointer<RkProperty> property;
@@ -29,14 +30,14 @@ QVector<Change> compress(const QVector<Change>& changes)
         if (!c.property)
             continue;
         auto it = std::find_if(out.begin(), out.end(),
-            [&](const Change& o) { return o.property == c.property; });
+                               [&](const Change& o) { return o.property == c.property; });
         if (it == out.end())
             out.append(c);
         else
             it->after = c.after;
     }
-    out.erase(std::remove_if(out.begin(), out.end(),
-                  [](const Change& c) { return c.before == c.after; }),
+    out.erase(
+        std::remove_if(out.begin(), out.end(), [](const Change& c) { return c.before == c.after; }),
         out.end());
     return out;
 }
@@ -116,7 +117,7 @@ int RkUndoStack::index() const
 }
 
 void RkUndoStack::recordPropertyChange(RkProperty* property, const QVariant& oldValue,
-    const QVariant& newValue)
+                                       const QVariant& newValue)
 {
     if (d->applying || d->marks.isEmpty() || !property)
         return;
@@ -176,7 +177,8 @@ void RkUndoStack::cancelHold(int id)
         return;
     const int mark = d->marks.at(level).second;
     d->marks.resize(level);
-    const QVector<Change> undone = d->pending.mid(mark);
+    // Each property goes back once, straight to where it was when the hold opened.
+    const QVector<Change> undone = compress(d->pending.mid(mark));
     d->pending.resize(mark);
     d->apply(undone, true);
 }
@@ -215,7 +217,7 @@ void RkUndoStack::clear()
 }
 
 void RkUndoStack::notifyCaptions(const QString& oldUndo, const QString& oldRedo, bool oldCanUndo,
-    bool oldCanRedo)
+                                 bool oldCanRedo)
 {
     if (oldUndo != getUndoCaption() || oldCanUndo != canUndo())
         Q_EMIT undoCaptionChanged(getUndoCaption());

@@ -13,7 +13,8 @@ class RkProperty;
 // Changes are recorded only while an RkUndoStackHold is open; the outermost hold turns them
 // into one entry when accepted, or takes them all back when cancelled. Changes made with no
 // hold open are not undoable.
-class RKCORE_EXPORT RkUndoStack : public QObject {
+class RKCORE_EXPORT RkUndoStack : public QObject
+{
     Q_OBJECT
 public:
     explicit RkUndoStack(QObject* parent = nullptr);
@@ -32,7 +33,7 @@ public:
 
     // Called by properties after a value change; ignored when no hold is open.
     void recordPropertyChange(RkProperty* property, const QVariant& oldValue,
-        const QVariant& newValue);
+                              const QVariant& newValue);
 
 public Q_SLOTS:
     // Both do nothing while a hold is open.
@@ -56,7 +57,7 @@ private:
     void acceptHold(int id, const QString& caption);
     void cancelHold(int id);
     void notifyCaptions(const QString& oldUndo, const QString& oldRedo, bool oldCanUndo,
-        bool oldCanRedo);
+                        bool oldCanRedo);
 
     struct Private;
     std::unique_ptr<Private> d;

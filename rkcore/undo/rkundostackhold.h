@@ -9,7 +9,8 @@
 // on the stack. A hold destroyed undecided cancels. A hold opened while another is open folds
 // into the outer one: its accept keeps its changes for the outer entry, its cancel takes back
 // only the changes made since it was opened.
-class RKCORE_EXPORT RkUndoStackHold {
+class RKCORE_EXPORT RkUndoStackHold
+{
 public:
     RkUndoStackHold();
     ~RkUndoStackHold();

@@ -77,11 +77,15 @@ void TestRkHost::scriptConstructsModuleClasses()
         var dock = mainWindow.findChild("RkToolPaneDock");
         print("dock", dock.visible, dock.windowTitle);
         print("tool", dock.findChild("Tool Pane Name").text);
+        mainWindow.findChild("RkAboutPluginsAction").trigger();
+        var about = mainWindow.findChild("AboutPluginsDialog");
+        print("about", about.visible, about.windowTitle);
     )"));
     const Run run = runHost({QStringLiteral("--script"), script});
     QVERIFY2(run.exitCode == 0, qPrintable(run.err));
     QCOMPARE(run.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts),
-             QStringList({"made Tool", "dock true Tool", "tool Universal"}));
+             QStringList({"made Tool", "dock true Tool", "tool Universal",
+                          "about true About Plug-ins"}));
 }
 
 void TestRkHost::scriptErrorExitsNonZero()

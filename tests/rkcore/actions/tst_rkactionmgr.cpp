@@ -87,7 +87,6 @@ private Q_SLOTS:
     void initTestCase();
     void init();
     void cleanup();
-    void menuTreeEditing();
     void copiesAreDeep();
     void buildMenu();
     void findActionCreatesOnceAndLogsUnknownOnce();
@@ -116,27 +115,6 @@ void TestRkActionMgr::init()
 void TestRkActionMgr::cleanup()
 {
     m_window.reset();
-}
-
-void TestRkActionMgr::menuTreeEditing()
-{
-    RkActionMenu menu;
-    menu.insertAction(QStringLiteral("B"));
-    menu.insertAction(QStringLiteral("A"), 0);
-    menu.insertSeparator(-1);
-    menu.insertAction(QStringLiteral("D"), 99); // past the end appends
-    menu.insertMenu(QStringLiteral("Sub"), new RkActionMenu, 3);
-    QCOMPARE(menu.count(), 5);
-    const QStringList expected = {"A", "B", "", "Sub", "D"};
-    for (int i = 0; i < menu.count(); ++i)
-        QCOMPARE(menu.entryText(i), expected.at(i));
-    QCOMPARE(menu.entryType(2), RkActionMenu::Separator);
-    QCOMPARE(menu.entryType(3), RkActionMenu::SubMenu);
-    QVERIFY(menu.subMenu(3));
-    menu.removeEntry(0);
-    menu.removeEntry(42);
-    QCOMPARE(menu.entryText(0), QStringLiteral("B"));
-    QCOMPARE(menu.count(), 4);
 }
 
 void TestRkActionMgr::copiesAreDeep()

@@ -1,5 +1,4 @@
 #include "rkapp.h"
-#include "rkmemory.h"
 #include "rkscene.h"
 #include "rktestmain.h"
 #include "rkundostack.h"
@@ -15,7 +14,6 @@ private Q_SLOTS:
     void mainWindowIsTheInterfaceWhileItLives();
     void busyCursorNests();
     void staticObjectsGoWithTheApp();
-    void allocator();
 };
 
 void TestRkApp::globalsLiveWithTheApp()
@@ -90,16 +88,6 @@ void TestRkApp::staticObjectsGoWithTheApp()
     QVERIFY(!first);
     QVERIFY(!second);
     QCOMPARE(order, QStringList({"second", "first"}));
-}
-
-void TestRkApp::allocator()
-{
-    QCOMPARE(rkMalloc(0), static_cast<void*>(nullptr));
-    rkFree(nullptr);
-    auto* block = static_cast<int*>(rkMalloc(64 * sizeof(int)));
-    QVERIFY(block);
-    block[63] = 7;
-    rkFree(block);
 }
 
 RK_TEST_MAIN(TestRkApp)

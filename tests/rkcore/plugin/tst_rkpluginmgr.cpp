@@ -30,7 +30,6 @@ class TestRkPluginMgr : public QObject {
 private Q_SLOTS:
     void guidKeepsTextAndComparesByValue_data();
     void guidKeepsTextAndComparesByValue();
-    void packedVersions();
     void registration();
     void refusedModules_data();
     void refusedModules();
@@ -68,14 +67,6 @@ void TestRkPluginMgr::guidKeepsTextAndComparesByValue()
     QCOMPARE(guid != second, !same);
     if (same)
         QCOMPARE(qHash(guid), qHash(second));
-}
-
-void TestRkPluginMgr::packedVersions()
-{
-    QCOMPARE(RkPlugin::versionToString(0x02000820), QStringLiteral("2.0.8.32"));
-    QCOMPARE(RkPlugin::versionToString(0x0300013D), QStringLiteral("3.0.1.61"));
-    QCOMPARE(RkPlugin::versionToString(0xFFFEFDFC), QStringLiteral("255.254.253.252"));
-    QCOMPARE(RkPlugin::packVersion(2, 0, 8, 32), quint32(0x02000820));
 }
 
 void TestRkPluginMgr::registration()

@@ -1,4 +1,3 @@
-#include "rkactionmenu.h"
 #include "rktestmain.h"
 #include "rkview.h"
 #include "rkviewport.h"
@@ -15,7 +14,6 @@ class TestRkViewport : public QObject {
 private Q_SLOTS:
     void viewTakesThePlaceOfThePicture();
     void toolsAndSwitching();
-    void toolMenuChangesAreAnnounced();
 };
 
 void TestRkViewport::viewTakesThePlaceOfThePicture()
@@ -85,19 +83,6 @@ void TestRkViewport::toolsAndSwitching()
     mgr.setActiveTool(first);
     for (QAction* action : bar->actions())
         QCOMPARE(action->isChecked(), action->objectName() == QLatin1String("First"));
-}
-
-void TestRkViewport::toolMenuChangesAreAnnounced()
-{
-    RkViewTool tool(QStringLiteral("Tool"));
-    QCOMPARE(tool.getOptionsMenu(), static_cast<RkActionMenu*>(nullptr));
-    QCOMPARE(tool.getOptionsWidget(nullptr), static_cast<QWidget*>(nullptr));
-    QSignalSpy rebuild(&tool, &RkViewTool::rebuildMenu);
-    auto* menu = new RkActionMenu;
-    tool.setOptionsMenu(menu);
-    QCOMPARE(tool.getOptionsMenu(), menu);
-    tool.setOptionsMenu(nullptr);
-    QCOMPARE(rebuild.count(), 2);
 }
 
 RK_TEST_MAIN(TestRkViewport)

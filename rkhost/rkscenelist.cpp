@@ -1,0 +1,146 @@
+#include "rkscenelist.h"
+
+#include "rkmainwindow.h"
+#include "rknode.h"
+#include "rkscene.h"
+
+#include <QDockWidget>
+#include <QHash>
+#include <QMouseEvent>
+#include <QPointer>
+#include <QTimer>
+
+RkSceneList::RkSceneList(QWidget* parent) : QTreeWidget(parent)
+{
+    setObjectName(QStringLiteral("SceneList"));
+    setHeaderHidden(true);
+    setColumnCount(1);
+    setSelectionMode(QAbstractItemView::NoSelection);
+    setFocusPolicy(Qt::NoFocus);
+
+    connect(rkScene, &RkScene::nodeAdded, this, &RkSceneList::scheduleRebuild);
+    connect(rkScene, &RkScene::nodeRemoved, this, &RkSceneList::scheduleRebuild);
+    connect(rkScene, &RkScene::nodeSelectionListChanged, this, &RkSceneList::showSelection);
+    // While a scene loads or clears, one rebuild at the end is enough.
+    connect(rkScene, &RkScene::sceneLoadStarting, this, [this] { m_blocked = true; });
+    connect(rkScene, &RkScene::sceneClearStarting, this, [this] { m_blocked = true; });
+    connect(rkScene, &RkScene::sceneLoaded, this, [this] {
+        m_blocked = false;
+        rebuild();
+    });
+    connect(rkScene, &RkScene::sceneCleared, this, [this] {
+        m_blocked = false;
+        rebuild();
+    });
+    rebuild();
+}
+
+RkSceneList::~RkSceneList() = default;
+
+QTreeWidgetItem* RkSceneList::itemForNode(const RkNode* node) const
+{
+    for (QTreeWidgetItemIterator it(const_cast<RkSceneList*>(this)); *it; ++it) {
+        if (nodeForItem(*it) == node)
+            return *it;
+    }
+    return nullptr;
+}
+
+RkNode* RkSceneList::nodeForItem(const QTreeWidgetItem* item) const
+{
+    // Guarded: a node may go before the list hears of it.
+    RkNode* node = m_nodes.value(item);
+    return node && rkScene->contains(node) ? node : nullptr;
+}
+
+void RkSceneList::mousePressEvent(QMouseEvent* event)
+{
+    if (event->button() != Qt::LeftButton) {
+        QTreeWidget::mousePressEvent(event);
+        return;
+    }
+    QTreeWidgetItem* item = itemAt(event->pos());
+    RkNode* node = nodeForItem(item);
+    // Presses on the expand arrow only fold the item.
+    const bool onArrow = item && event->pos().x() < visualItemRect(item).left();
+    if (!node || onArrow) {
+        QTreeWidget::mousePressEvent(event);
+        if (!item)
+            rkScene->clearSelection();
+        return;
+    }
+    const bool add = event->modifiers() & Qt::ControlModifier;
+    if (add && node->isSelected())
+        rkScene->deselectNode(node);
+    else
+        rkScene->selectNode(node, add);
+    event->accept();
+}
+
+void RkSceneList::scheduleRebuild()
+{
+    if (m_blocked || m_rebuildPending)
+        return;
+    m_rebuildPending = true;
+    QTimer::singleShot(0, this, [this] {
+        m_rebuildPending = false;
+        if (!m_blocked)
+            rebuild();
+    });
+}
+
+void RkSceneList::rebuild()
+{
+    clear();
+    m_nodes.clear();
+    QHash<const RkNode*, QTreeWidgetItem*> items;
+    const RkNodeList nodes = rkScene->getNodes();
+    // Parents come first however the scene lists them.
+    std::function<QTreeWidgetItem*(RkNode*)> itemFor = [&](RkNode* node) -> QTreeWidgetItem* {
+        if (QTreeWidgetItem* done = items.value(node))
+            return done;
+        RkNode* parent = node->getNodeParent();
+        QTreeWidgetItem* item = parent && rkScene->contains(parent)
+                                    ? new QTreeWidgetItem(itemFor(parent))
+                                    : new QTreeWidgetItem(this);
+        item->setText(0, node->getLabel());
+        m_nodes.insert(item, node);
+        items.insert(node, item);
+        connect(node, &RkElement::labelChanged, this, &RkSceneList::scheduleRebuild,
+                Qt::UniqueConnection);
+        return item;
+    };
+    for (RkNode* node : nodes)
+        itemFor(node);
+    // Top-level nodes show what lies directly below them.
+    for (int i = 0; i < topLevelItemCount(); ++i)
+        topLevelItem(i)->setExpanded(true);
+    showSelection();
+}
+
+void RkSceneList::showSelection()
+{
+    const QColor highlight = palette().color(QPalette::Highlight);
+    const QColor highlightText = palette().color(QPalette::HighlightedText);
+    for (QTreeWidgetItemIterator it(this); *it; ++it) {
+        RkNode* node = nodeForItem(*it);
+        const bool on = node && node->isSelected();
+        (*it)->setBackground(0, on ? QBrush(highlight) : QBrush());
+        (*it)->setForeground(0, on ? QBrush(highlightText) : QBrush());
+        QFont font = (*it)->font(0);
+        font.setBold(node && node == rkScene->getPrimarySelection());
+        (*it)->setFont(0, font);
+    }
+    if (QTreeWidgetItem* primary = itemForNode(rkScene->getPrimarySelection()))
+        scrollToItem(primary);
+}
+
+RkSceneList* rkAddSceneList(RkMainWindow* window)
+{
+    auto* dock = new QDockWidget(RkSceneList::tr("Scene"), window);
+    dock->setObjectName(QStringLiteral("SceneDock"));
+    auto* list = new RkSceneList(dock);
+    dock->setWidget(list);
+    window->addDockWidget(Qt::LeftDockWidgetArea, dock);
+    return list;
+}

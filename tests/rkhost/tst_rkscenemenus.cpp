@@ -1,0 +1,142 @@
+#include "rkbone.h"
+#include "rkdemoscene.h"
+#include "rkfloatproperty.h"
+#include "rkmainwindow.h"
+#include "rkscene.h"
+#include "rkscenelist.h"
+#include "rkscenemenus.h"
+#include "rkskeleton.h"
+#include "rktestmain.h"
+#include "rkundostack.h"
+#include "rkundostackhold.h"
+
+#include <QAction>
+#include <QMessageBox>
+#include <QTemporaryDir>
+
+class TestRkSceneMenus : public QObject
+{
+    Q_OBJECT
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void undoRedoCarryTheirCaptions();
+    void badFileKeepsTheSceneAndSaysWhy();
+    void saveThenOpenBringsTheSceneBack();
+    void sceneListSelects();
+
+private:
+    RkMainWindow* window = nullptr;
+    RkSceneMenus* menus = nullptr;
+    RkSceneList* list = nullptr;
+    QTemporaryDir dir;
+};
+
+void TestRkSceneMenus::init()
+{
+    rkScene->clear();
+    rkScene->setFileName(QString());
+    window = new RkMainWindow;
+    menus = new RkSceneMenus(window);
+    list = rkAddSceneList(window);
+    rkBuildDemoScene(rkScene);
+    window->resize(900, 700);
+    window->show();
+    QVERIFY(QTest::qWaitForWindowExposed(window));
+}
+
+void TestRkSceneMenus::cleanup()
+{
+    delete window;
+    window = nullptr;
+}
+
+void TestRkSceneMenus::undoRedoCarryTheirCaptions()
+{
+    auto* smile =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    QCOMPARE(menus->undoAction()->text(), QStringLiteral("&Undo"));
+    QVERIFY(!menus->undoAction()->isEnabled());
+    {
+        RkUndoStackHold hold;
+        smile->setValue(0.8f);
+        hold.accept("Mixer Drag");
+    }
+    QCOMPARE(menus->undoAction()->text(), QStringLiteral("&Undo Mixer Drag"));
+    QVERIFY(menus->undoAction()->isEnabled());
+    menus->undoAction()->trigger();
+    QCOMPARE(smile->getValue(), 0.0f);
+    QCOMPARE(menus->undoAction()->text(), QStringLiteral("&Undo"));
+    QCOMPARE(menus->redoAction()->text(), QStringLiteral("&Redo Mixer Drag"));
+    menus->redoAction()->trigger();
+    QCOMPARE(smile->getValue(), 0.8f);
+    QVERIFY(!menus->redoAction()->isEnabled());
+}
+
+void TestRkSceneMenus::badFileKeepsTheSceneAndSaysWhy()
+{
+    const QString path = dir.filePath("broken.rks");
+    QFile f(path);
+    QVERIFY(f.open(QIODevice::WriteOnly));
+    f.write("RKSCENE\x1a this is not a scene at all");
+    f.close();
+    const int nodes = rkScene->getNumNodes();
+    QVERIFY(!menus->openScene(path));
+    QCOMPARE(rkScene->getNumNodes(), nodes);
+    auto* box = window->findChild<QMessageBox*>("SceneMessage");
+    QVERIFY(box);
+    QTRY_VERIFY(box->isVisible());
+    QVERIFY2(box->text().contains("broken.rks") && box->text().contains("unchanged"),
+             qPrintable(box->text()));
+    QVERIFY2(box->text().contains("format version"), qPrintable(box->text()));
+    box->close();
+}
+
+void TestRkSceneMenus::saveThenOpenBringsTheSceneBack()
+{
+    const QString path = dir.filePath("kept.rks");
+    auto* smile =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    smile->setValue(0.4f);
+    QVERIFY(menus->saveScene(path));
+    QCOMPARE(window->windowTitle(), QStringLiteral("kept.rks - rkhost"));
+    menus->newAction()->trigger();
+    QCOMPARE(rkScene->getNumNodes(), 0);
+    QCOMPARE(list->topLevelItemCount(), 0);
+    QCOMPARE(window->windowTitle(), QStringLiteral("rkhost"));
+    QVERIFY(menus->openScene(path));
+    auto* loaded =
+        qobject_cast<RkFloatProperty*>(rkScene->findNode(RkDemoFigureName)->findProperty("Smile"));
+    QCOMPARE(loaded->getValue(), 0.4f);
+    // The list shows the loaded scene: figure, prop, camera and light at the top.
+    QCOMPARE(list->topLevelItemCount(), 4);
+}
+
+void TestRkSceneMenus::sceneListSelects()
+{
+    QTRY_VERIFY(list->topLevelItemCount() > 0);
+    RkNode* camera = rkScene->findNode(RkDemoCameraName);
+    RkNode* prop = rkScene->findNode(RkDemoPropName);
+    QTreeWidgetItem* cameraItem = list->itemForNode(camera);
+    QVERIFY(cameraItem);
+    QTest::mouseClick(list->viewport(), Qt::LeftButton, {},
+                      list->visualItemRect(cameraItem).center());
+    QCOMPARE(rkScene->getPrimarySelection(), camera);
+
+    QTest::mouseClick(list->viewport(), Qt::LeftButton, Qt::ControlModifier,
+                      list->visualItemRect(list->itemForNode(prop)).center());
+    QCOMPARE(rkScene->getSelectedNodes(), RkNodeList({camera, prop}));
+    QVERIFY(list->itemForNode(prop)->font(0).bold());
+    QVERIFY(!cameraItem->font(0).bold());
+
+    // Selecting elsewhere shows in the list.
+    auto* figure = qobject_cast<RkSkeleton*>(rkScene->findNode(RkDemoFigureName));
+    rkScene->selectNode(figure->findBone("head"));
+    QTreeWidgetItem* head = list->itemForNode(figure->findBone("head"));
+    QVERIFY(head);
+    QCOMPARE(head->background(0).color(), list->palette().color(QPalette::Highlight));
+    QCOMPARE(cameraItem->background(0).style(), Qt::NoBrush);
+}
+
+RK_TEST_MAIN(TestRkSceneMenus)
+#include "tst_rkscenemenus.moc"
