@@ -641,10 +641,10 @@ QVector<RkMorphDeltas> RkDemoMesh::boneMorphs(int bone) const
 
 std::unique_ptr<RkSubDMesh> RkDemoMesh::createPropMesh(const RkVec3& centre)
 {
-    // A cube cage of 3 by 3 patches per face, pulled half way towards a sphere so the prop reads
-    // as a rounded box; each face is its own UV island in a cross layout.
+    // A cube cage of 4 by 4 patches per face, pulled most of the way onto a sphere so the prop
+    // reads as a ball; each face is its own UV island in a cross layout.
     auto mesh = std::make_unique<RkSubDMesh>();
-    const int n = 3;
+    const int n = 4;
     const float half = 0.2f;
     struct Face {
         RkVec3 normal, du, dv;
@@ -673,9 +673,9 @@ std::unique_ptr<RkSubDMesh> RkDemoMesh::createPropMesh(const RkVec3& centre)
                                         .arg(qRound(cube.z * n));
                 auto it = shared.constFind(key);
                 if (it == shared.constEnd()) {
-                    const RkVec3 sphere = cube.normalized() * 1.2f;
+                    const RkVec3 sphere = cube.normalized() * 1.1f;
                     it = shared.insert(
-                        key, mesh->addVertex(centre + (cube * 0.5f + sphere * 0.5f) * half));
+                        key, mesh->addVertex(centre + (cube * 0.15f + sphere * 0.85f) * half));
                 }
                 vid[i][j] = it.value();
                 uid[i][j] = mesh->addUV(face.cu + inset + (island - 2 * inset) * i / n,

@@ -143,10 +143,11 @@ void TestRkDemoMesh::bonesFormAHierarchy()
 void TestRkDemoMesh::propIsASubdivisionCage()
 {
     const auto prop = RkDemoMesh::createPropMesh(RkVec3(0.6f, 0.2f, 0.3f));
-    QCOMPARE(prop->getNumPatches(), 54);
-    // Corners shared between faces are welded: a closed 3x3x3 cube cage has 56 vertices.
-    QCOMPARE(prop->getNumVertices(), 56);
-    QCOMPARE(prop->getUVs()->getNumValues(), 6 * 16);
+    QCOMPARE(prop->getNumPatches(), 6 * 16);
+    // Points shared between faces are welded: a closed cage of 4 by 4 patches per face has
+    // 6 * 16 + 2 vertices.
+    QCOMPARE(prop->getNumVertices(), 98);
+    QCOMPARE(prop->getUVs()->getNumValues(), 6 * 25);
     RkVec3 lo, hi;
     QVERIFY(prop->getBounds(lo, hi));
     QVERIFY(lo.x > 0.3f); // beside the figure, not inside it
