@@ -3,14 +3,31 @@
 #include "rkmap.h"
 
 #include <algorithm>
+#include <atomic>
 
-RkGeometry::RkGeometry() : m_uvs(std::make_unique<RkMap>(RkMap::Point2D)) {}
+namespace
+{
+
+std::atomic<quint64> nextRevision{1};
+
+} // namespace
+
+RkGeometry::RkGeometry() : m_uvs(std::make_unique<RkMap>(RkMap::Point2D))
+{
+    touch();
+}
+
+void RkGeometry::touch()
+{
+    m_revision = nextRevision++;
+}
 
 RkGeometry::~RkGeometry() = default;
 
 int RkGeometry::addVertex(const RkVec3& v)
 {
     m_vertices.append(v);
+    touch();
     return m_vertices.size() - 1;
 }
 

@@ -33,6 +33,10 @@ public:
     void setUVs(RkMap* map);
     int addUV(float u, float v);
 
+    // A number that no other geometry has had and that changes whenever vertices or facets are
+    // added, so caches can tell a geometry and its topology apart from any earlier one.
+    quint64 getRevision() const { return m_revision; }
+
     // Axis-aligned bounds of the vertices; false for a geometry without vertices.
     bool getBounds(RkVec3& min, RkVec3& max) const;
 
@@ -45,10 +49,12 @@ public:
     virtual int getFacetMaterial(int facet) const = 0;
 
 protected:
+    void touch();
     bool verticesInRange(const int* indices, int n) const;
     bool uvsInRange(const int* indices, int n) const;
 
 private:
     QVector<RkVec3> m_vertices;
     std::unique_ptr<RkMap> m_uvs;
+    quint64 m_revision = 0;
 };

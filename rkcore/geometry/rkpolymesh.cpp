@@ -9,6 +9,7 @@ bool RkPolyMesh::addTri(const RkTriFacet& tri)
     if (!verticesInRange(tri.vertices, 3) || !uvsInRange(tri.uvs, 3))
         return false;
     m_tris.append(tri);
+    touch();
     return true;
 }
 
@@ -17,6 +18,7 @@ bool RkPolyMesh::addQuad(const RkQuadFacet& quad)
     if (!verticesInRange(quad.vertices, 4) || !uvsInRange(quad.uvs, 4))
         return false;
     m_quads.append(quad);
+    touch();
     return true;
 }
 

@@ -9,5 +9,6 @@ bool RkSubDMesh::addPatch(const RkSubDPatch& patch)
     if (!verticesInRange(patch.vertices, 4) || !uvsInRange(patch.uvs, 4))
         return false;
     m_patches.append(patch);
+    touch();
     return true;
 }

@@ -216,9 +216,9 @@ void Rk3DViewport::frameCamera()
     const RkVec3 up = right.cross(forward).normalized();
     float distance = 0.01f;
     for (int corner = 0; corner < 8; ++corner) {
-        const RkVec3 c = RkVec3(corner & 1 ? hi.x : lo.x, corner & 2 ? hi.y : lo.y,
-                                corner & 4 ? hi.z : lo.z) -
-                         centre;
+        const RkVec3 c =
+            RkVec3(corner & 1 ? hi.x : lo.x, corner & 2 ? hi.y : lo.y, corner & 4 ? hi.z : lo.z) -
+            centre;
         const float depth = c.dot(forward);
         distance = std::max(distance, std::fabs(c.dot(right)) / tanX - depth);
         distance = std::max(distance, std::fabs(c.dot(up)) / tanY - depth);

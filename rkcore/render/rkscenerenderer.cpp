@@ -21,24 +21,22 @@ const RkVec3* positionsOf(const RkSceneRenderer::Item& item)
     return item.geometry->getVerticesPtr();
 }
 
-// Triangle indices of a geometry grouped by material, kept while the geometry's facet count
-// stays the same.
+// Triangle indices of a geometry grouped by material, kept while the geometry's revision stays
+// the same.
 struct TriangleCache {
-    int facets = -1;
-    int vertices = -1;
+    quint64 revision = 0;
     QVector<int> materials;          // material of each group
     QVector<QVector<GLuint>> groups; // triangle corner indices of each group
 };
 
 void buildTriangles(const RkGeometry* g, TriangleCache& cache)
 {
-    cache.facets = g->getNumFacets();
-    cache.vertices = g->getNumVertices();
+    cache.revision = g->getRevision();
     cache.materials.clear();
     cache.groups.clear();
     int slot[256];
     std::fill(std::begin(slot), std::end(slot), -1);
-    for (int f = 0; f < cache.facets; ++f) {
+    for (int f = 0, n = g->getNumFacets(); f < n; ++f) {
         const int m = g->getFacetMaterial(f) & 0xff;
         if (slot[m] < 0) {
             slot[m] = cache.groups.size();
@@ -208,7 +206,7 @@ void RkSceneRenderer::draw(const QVector<Item>& items, const Camera& camera, int
         if (!g || g->getNumVertices() == 0 || g->getNumFacets() == 0)
             continue;
         TriangleCache& cache = d->triangles[g];
-        if (cache.facets != g->getNumFacets() || cache.vertices != g->getNumVertices())
+        if (cache.revision != g->getRevision())
             buildTriangles(g, cache);
         const RkVec3* p = positionsOf(item);
         computeNormals(g, p, d->normals);

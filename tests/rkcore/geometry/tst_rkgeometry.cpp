@@ -115,12 +115,18 @@ void TestRkGeometry::meshRefusesFacetsOutOfRange()
     tri.uvs[1] = 1;
     tri.uvs[2] = 3;
     tri.material = 255;
+    const quint64 before = mesh.getRevision();
     QVERIFY(mesh.addTri(tri));
+    const quint64 after = mesh.getRevision();
+    QVERIFY(after != before);
     tri.uvs[2] = 4; // one past the UV map
     QVERIFY(!mesh.addTri(tri));
     tri.uvs[2] = 3;
     tri.vertices[1] = -1;
     QVERIFY(!mesh.addTri(tri));
+    QCOMPARE(mesh.getRevision(), after); // refused facets change nothing
+    // A new mesh never reuses a revision, even at the address of a deleted one.
+    QVERIFY(RkPolyMesh().getRevision() > after);
     QCOMPARE(mesh.getNumTris(), 1);
     QCOMPARE(mesh.getTrisPtr()[0].material, quint8(255));
 

@@ -13,7 +13,8 @@
 #include <QSignalSpy>
 #include <QTemporaryDir>
 
-namespace {
+namespace
+{
 
 QList<RkShape*> shapesOf(const RkMaterial* material)
 {
@@ -34,7 +35,8 @@ RkPolyMesh* twoPointMesh()
 
 } // namespace
 
-class TestRkObject : public QObject {
+class TestRkObject : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void cleanup();
