@@ -1,6 +1,5 @@
 #include "rk3dviewport.h"
 
-#include "rkapp.h"
 #include "rkfloatproperty.h"
 #include "rkgeometry.h"
 #include "rkmaterial.h"

@@ -2,8 +2,7 @@
 
 #include "rkgeometry.h"
 
-#include <QOpenGLContext>
-#include <QtOpenGL>
+#include <QHash>
 
 #include <GL/gl.h>
 
@@ -195,8 +194,8 @@ void RkSceneRenderer::draw(const QVector<Item>& items, const Camera& camera, int
         glEnable(GL_LIGHTING);
     }
 
-    const GLfloat specular[4] = {0.12f, 0.12f, 0.12f, 1.0f};
-    glMaterialfv(GL_FRONT_AND_BACK, GL_SPECULAR, specular);
+    const GLfloat shine[4] = {0.12f, 0.12f, 0.12f, 1.0f};
+    glMaterialfv(GL_FRONT_AND_BACK, GL_SPECULAR, shine);
     glMaterialf(GL_FRONT_AND_BACK, GL_SHININESS, 24.0f);
 
     glEnableClientState(GL_VERTEX_ARRAY);
