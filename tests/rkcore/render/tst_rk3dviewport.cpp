@@ -9,6 +9,7 @@
 #include "rktestmain.h"
 #include "rkundostack.h"
 #include "rkundostackhold.h"
+#include "rkviewport.h"
 
 #include <QSignalSpy>
 
@@ -86,6 +87,7 @@ private Q_SLOTS:
     void refusesRendersItCannotMake();
     void cancelledHoldTakesFramingBack();
     void clickSelectsAndDragOrbits();
+    void viewportHandsOutItsScenePicture();
 
 private:
     QImage render(const QSize& size = QSize(96, 96));
@@ -255,6 +257,17 @@ void TestRk3DViewport::clickSelectsAndDragOrbits()
     QTest::mouseRelease(m_view.get(), Qt::LeftButton, Qt::NoModifier, QPoint(160, 100));
     QVERIFY(std::fabs(m_view->getCamera().yaw - (yaw - 24.0f)) < 0.01f);
     QCOMPARE(rkScene->getNumSelectedNodes(), 0);
+}
+
+void TestRk3DViewport::viewportHandsOutItsScenePicture()
+{
+    RkViewport viewport;
+    QVERIFY(!viewport.get3DViewport());
+    viewport.setViewWidget(new QWidget);
+    QVERIFY(!viewport.get3DViewport()); // some other picture
+    auto* view = new Rk3DViewport;
+    viewport.setViewWidget(view);
+    QCOMPARE(viewport.get3DViewport(), view);
 }
 
 RK_TEST_MAIN(TestRk3DViewport)
