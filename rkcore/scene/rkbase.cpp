@@ -32,7 +32,13 @@ void RkBase::finishLoad(RkInFile*) {}
 
 void RkBase::postLoadFile(RkInFile*) {}
 
-void RkBase::setPointer(const RkInFile*, short, short, RkBase*) {}
+void RkBase::setPointer(const RkInFile*, short sectionId, short, RkBase*)
+{
+    // A pointer nobody takes would leave its object to nobody: the load fails instead.
+    throw QStringLiteral("%1 takes no pointer from section 0x%2")
+        .arg(className())
+        .arg(quint16(sectionId), 0, 16);
+}
 
 void RkBase::setStorablePaths(const QString&) {}
 

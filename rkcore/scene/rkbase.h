@@ -28,7 +28,8 @@ public:
     virtual void postLoadFile(RkInFile* file);
     // Resolves a pointer read with RkInFile::readPointer() in section sectionId. An object that
     // was created for the file and is handed over here belongs to this object from now on;
-    // an object of the wrong class must be refused by throwing (the asserting cast does).
+    // an object of the wrong class must be refused by throwing a QString (the asserting cast
+    // does). The default throws: a class that reads pointers resolves them itself.
     virtual void setPointer(const RkInFile* file, short sectionId, short index, RkBase* object);
     virtual void setStorablePaths(const QString& basePath);
     // Writes the object's sections.

@@ -4,6 +4,7 @@
 #include "rkproperty.h"
 #include "rkpropertygrouptree.h"
 
+#include <QHash>
 #include <QPointer>
 
 namespace
@@ -25,6 +26,8 @@ struct RkElement::Private {
     QString label;
     RkPropertyGroupTree* groups = nullptr; // child of the element
     QList<RkProperty*> properties;
+    // Look-up by name for big rigs; checked against the name on use, as names may change.
+    QHash<QString, RkProperty*> byName;
     QList<RkElementData*> dataItems;
     QPointer<RkElement> elementParent;
 };
@@ -79,8 +82,16 @@ void RkElement::addProperty(RkProperty* property, const QString& groupPath)
     if (!d->properties.contains(property)) {
         property->setParent(this);
         d->properties.append(property);
-        connect(property, &QObject::destroyed, this,
-                [this](QObject* object) { dropDestroyed(d->properties, object); });
+        d->byName.insert(property->getName(), property);
+        connect(property, &QObject::destroyed, this, [this](QObject* object) {
+            dropDestroyed(d->properties, object);
+            for (auto it = d->byName.begin(); it != d->byName.end();) {
+                if (static_cast<QObject*>(it.value()) == object)
+                    it = d->byName.erase(it);
+                else
+                    ++it;
+            }
+        });
     }
     d->groups->addProperty(property, groupPath);
 }
@@ -90,12 +101,16 @@ void RkElement::removeProperty(RkProperty* property)
     if (!property || !d->properties.contains(property))
         return;
     d->properties.removeAll(property);
+    d->byName.remove(property->getName());
     d->groups->removeProperty(property);
     delete property;
 }
 
 RkProperty* RkElement::findProperty(const QString& name) const
 {
+    RkProperty* hit = d->byName.value(name);
+    if (hit && hit->getName() == name)
+        return hit;
     for (RkProperty* p : d->properties) {
         if (p->getName() == name)
             return p;

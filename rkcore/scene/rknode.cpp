@@ -348,7 +348,7 @@ void RkNode::loadSection(RkInFile* file, short sectionId)
     }
 }
 
-void RkNode::setPointer(const RkInFile*, short sectionId, short, RkBase* object)
+void RkNode::setPointer(const RkInFile* file, short sectionId, short index, RkBase* object)
 {
     if (sectionId == SectionParent) {
         if (!object)
@@ -372,5 +372,7 @@ void RkNode::setPointer(const RkInFile*, short sectionId, short, RkBase* object)
             throw QStringLiteral("node \"%1\" holds two data items named \"%2\"")
                 .arg(getName(), item->getName());
         addDataItem(item);
+        return;
     }
+    RkElement::setPointer(file, sectionId, index, object);
 }
