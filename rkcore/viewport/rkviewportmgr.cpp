@@ -36,9 +36,12 @@ void RkViewportMgr::addTool(RkViewTool* tool)
         return;
     tool->setParent(this);
     d->tools.append(tool);
-    connect(tool, &QObject::destroyed, this, [this, tool] { d->tools.removeAll(tool); });
-
     auto* action = new QAction(tool->getIcon(), tool->objectName(), d->group);
+    // A tool deleted by its owner takes its button along.
+    connect(tool, &QObject::destroyed, this, [this, tool, action] {
+        d->tools.removeAll(tool);
+        delete action;
+    });
     action->setObjectName(tool->objectName());
     action->setCheckable(true);
     action->setToolTip(tool->objectName());

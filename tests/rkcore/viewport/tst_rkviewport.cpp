@@ -83,6 +83,12 @@ void TestRkViewport::toolsAndSwitching()
     mgr.setActiveTool(first);
     for (QAction* action : bar->actions())
         QCOMPARE(action->isChecked(), action->objectName() == QLatin1String("First"));
+
+    // A tool that goes away leaves no button behind that could reach it.
+    delete second;
+    QCOMPARE(mgr.getTools().size(), 1);
+    QCOMPARE(bar->actions().size(), 1);
+    QTRY_VERIFY(!bar->findChild<QWidget*>(QStringLiteral("Second")));
 }
 
 RK_TEST_MAIN(TestRkViewport)
