@@ -310,7 +310,9 @@ void Rk3DViewport::paintGL()
 
 void Rk3DViewport::mousePressEvent(QMouseEvent* event)
 {
-    if (d->dragButton != Qt::NoButton)
+    // A second button during a drag changes nothing; a drag whose release went elsewhere (a
+    // popup took it) ends with the next press.
+    if (d->dragButton != Qt::NoButton && event->buttons() != event->button())
         return;
     d->dragButton = event->button();
     if (d->dragButton == Qt::LeftButton && (event->modifiers() & Qt::AltModifier))

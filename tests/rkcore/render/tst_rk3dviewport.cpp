@@ -257,6 +257,13 @@ void TestRk3DViewport::clickSelectsAndDragOrbits()
     QTest::mouseRelease(m_view.get(), Qt::LeftButton, Qt::NoModifier, QPoint(160, 100));
     QVERIFY(std::fabs(m_view->getCamera().yaw - (yaw - 24.0f)) < 0.01f);
     QCOMPARE(rkScene->getNumSelectedNodes(), 0);
+
+    // Rolling the wheel forwards comes closer.
+    const float distance = m_view->getCamera().distance;
+    QWheelEvent wheel(QPointF(100, 100), QPointF(m_view->mapToGlobal(QPoint(100, 100))), QPoint(),
+                      QPoint(0, 120), Qt::NoButton, Qt::NoModifier, Qt::NoScrollPhase, false);
+    QApplication::sendEvent(m_view.get(), &wheel);
+    QVERIFY(m_view->getCamera().distance < distance);
 }
 
 void TestRk3DViewport::viewportHandsOutItsScenePicture()
