@@ -4,6 +4,7 @@
 #include "rkapp.h"
 #include "rkdemoscene.h"
 #include "rkdemotools.h"
+#include "rkgldriver.h"
 #include "rkhostactions.h"
 #include "rkmainwindow.h"
 #include "rkpanemgr.h"
@@ -97,6 +98,7 @@ int main(int argc, char** argv)
         }
     }
 
+    rkKeepGLDriverLoaded();
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("rkhost"));
     QApplication::setOrganizationName(QStringLiteral("rkhost"));
@@ -175,7 +177,10 @@ int main(int argc, char** argv)
             // Give layouts, docks and posted refreshes time to settle before grabbing.
             QTimer::singleShot(500, &app, [&] {
                 // Read back what the display shows: the 3D viewport draws with OpenGL into its
-                // own surface, which a widget grab would leave black.
+                // own surface, which a widget grab would leave black. Its picture is drawn and
+                // handed to the display first, so a busy machine cannot leave it out.
+                sceneView->updateGL();
+                QApplication::sync();
                 QImage shot = window.screen()->grabWindow(window.winId()).toImage();
                 if (shot.isNull())
                     shot = window.grab().toImage();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "rkapp.h"
+#include "rkgldriver.h"
 #include "rkmainwindow.h"
 #include "rkstyle.h"
 
@@ -9,23 +10,6 @@
 #include <QtTest>
 
 #include <memory>
-
-#if defined(__SANITIZE_ADDRESS__)
-#include <dlfcn.h>
-#endif
-
-// Under the leak checker, keeps the software OpenGL driver loaded until the program ends: its own
-// leftovers are then reported under its name, which the suppressions list, instead of under an
-// unloaded module that no suppression can name.
-inline void rkKeepGLDriverLoaded()
-{
-#if defined(__SANITIZE_ADDRESS__)
-    for (const char* path : {"/usr/lib/x86_64-linux-gnu/dri/swrast_dri.so", "swrast_dri.so"}) {
-        if (dlopen(path, RTLD_NOW | RTLD_NODELETE))
-            return;
-    }
-#endif
-}
 
 // main() for a QtTest program that needs the host core: a QApplication with the host style, then
 // the RkApp that owns the scene, the undo stack and the script engine (marked running, as after
