@@ -202,6 +202,7 @@ struct RkSceneReader::Private {
     bool parse(QVector<Record>& records);
     bool build(const QVector<Record>& records);
     bool resolvePointers();
+    bool checkHierarchy();
     void discard();
 };
 
@@ -410,6 +411,33 @@ bool RkSceneReader::Private::resolvePointers()
     return true;
 }
 
+bool RkSceneReader::Private::checkHierarchy()
+{
+    // Depths with memory, so that long chains cost one walk each.
+    QHash<const RkNode*, int> depth;
+    for (size_t i = 0; i < objects.size(); ++i) {
+        auto* node = isNode[i] ? static_cast<RkNode*>(objects[i].data()) : nullptr;
+        if (!node)
+            continue;
+        QList<const RkNode*> chain;
+        int base = 0;
+        for (const RkNode* n = node; n; n = n->getNodeParent()) {
+            const auto known = depth.constFind(n);
+            if (known != depth.constEnd()) {
+                base = *known;
+                break;
+            }
+            chain.append(n);
+        }
+        for (int k = chain.size() - 1; k >= 0; --k)
+            depth.insert(chain.at(k), ++base);
+        if (base > RkNode::MaxHierarchyDepth)
+            return fail(QStringLiteral("the node hierarchy is deeper than %1 levels")
+                            .arg(RkNode::MaxHierarchyDepth));
+    }
+    return true;
+}
+
 void RkSceneReader::Private::discard()
 {
     // Nodes first: they take their data items, and those what they adopted. Whatever is left
@@ -445,7 +473,7 @@ bool RkSceneReader::read(const QByteArray& bytes, const QString& fileName)
     d->file.d->data = bytes;
     d->file.d->fileName = fileName;
     QVector<Private::Record> records;
-    bool ok = d->parse(records) && d->build(records) && d->resolvePointers();
+    bool ok = d->parse(records) && d->build(records) && d->resolvePointers() && d->checkHierarchy();
     if (ok) {
         // Content that the file names but does not hold, such as geometry, is rebuilt now,
         // while a failure can still leave the scene alone.

@@ -134,6 +134,13 @@ bool RkNode::setNodeParent(RkNode* parent)
         if (up == this)
             return false;
     }
+    linkParent(parent);
+    emitTransformChanged();
+    return true;
+}
+
+void RkNode::linkParent(RkNode* parent)
+{
     if (d->parent) {
         d->parent->d->children.removeAll(this);
         Q_EMIT d->parent->nodeChildrenChanged();
@@ -144,8 +151,6 @@ bool RkNode::setNodeParent(RkNode* parent)
         parent->d->children.append(this);
         Q_EMIT parent->nodeChildrenChanged();
     }
-    emitTransformChanged();
-    return true;
 }
 
 QList<RkNode*> RkNode::getNodeChildren() const
@@ -253,9 +258,13 @@ void RkNode::setSource(const QString& source)
 
 void RkNode::emitTransformChanged()
 {
-    Q_EMIT transformChanged();
-    for (RkNode* child : qAsConst(d->children))
-        child->emitTransformChanged();
+    // Without recursion: a hierarchy may be deep.
+    QList<RkNode*> pending{this};
+    while (!pending.isEmpty()) {
+        RkNode* node = pending.takeLast();
+        Q_EMIT node->transformChanged();
+        pending += node->d->children;
+    }
 }
 
 void RkNode::save(RkOutFile* file) const
@@ -357,8 +366,17 @@ void RkNode::setPointer(const RkInFile* file, short sectionId, short index, RkBa
         if (!parent)
             throw QStringLiteral("the parent of node \"%1\" is a %2, not a node")
                 .arg(getName(), object->className());
-        if (!setNodeParent(parent))
-            throw QStringLiteral("node \"%1\" would be its own parent").arg(getName());
+        // Nothing watches a node being loaded, so it is linked without signals; a loop or a
+        // hierarchy deeper than any rig fails the load.
+        int levels = 0;
+        for (RkNode* up = parent; up; up = up->getNodeParent()) {
+            if (up == this)
+                throw QStringLiteral("node \"%1\" would be its own parent").arg(getName());
+            if (++levels >= MaxHierarchyDepth)
+                throw QStringLiteral("the node hierarchy is deeper than %1 levels")
+                    .arg(MaxHierarchyDepth);
+        }
+        linkParent(parent);
         return;
     }
     if (sectionId == SectionDataItems) {

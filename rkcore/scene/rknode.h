@@ -29,6 +29,8 @@ public:
     // Moves the node under a new parent (null: top level). A parent that would make a loop is
     // refused.
     bool setNodeParent(RkNode* parent);
+    // A scene file with a deeper node hierarchy is refused.
+    static constexpr int MaxHierarchyDepth = 512;
     QList<RkNode*> getNodeChildren() const;
 
     bool isSelected() const;
@@ -76,6 +78,7 @@ private:
     friend class RkScene;
     void setSelectedFlag(bool on);
     void emitTransformChanged();
+    void linkParent(RkNode* parent);
 
     struct Private;
     std::unique_ptr<Private> d;

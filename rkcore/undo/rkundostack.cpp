@@ -2,6 +2,7 @@
 
 #include "rkproperty.h"
 
+#include <QHash>
 #include <QPointer>
 #include <QVector>
 
@@ -26,15 +27,17 @@ struct Entry {
 QVector<Change> compress(const QVector<Change>& changes)
 {
     QVector<Change> out;
+    QHash<const RkProperty*, int> seen; // a hold on a big rig may touch thousands
     for (const Change& c : changes) {
         if (!c.property)
             continue;
-        auto it = std::find_if(out.begin(), out.end(),
-                               [&](const Change& o) { return o.property == c.property; });
-        if (it == out.end())
+        const auto it = seen.constFind(c.property.data());
+        if (it == seen.constEnd()) {
+            seen.insert(c.property.data(), out.size());
             out.append(c);
-        else
-            it->after = c.after;
+        } else {
+            out[*it].after = c.after;
+        }
     }
     out.erase(
         std::remove_if(out.begin(), out.end(), [](const Change& c) { return c.before == c.after; }),

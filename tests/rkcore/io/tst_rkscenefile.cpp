@@ -462,6 +462,18 @@ void TestRkSceneFile::badInputLeavesTheSceneAlone_data()
             {0x301, FileBuilder::intValue(1) + FileBuilder::floatValue(qQNaN())}};
         QTest::newRow("float for a pointer") << b.bytes() << "where a pointer belongs";
     }
+    for (int step : {-1, 1}) {
+        // A chain of nodes deeper than any rig, linked upwards and downwards.
+        FileBuilder b;
+        const int count = RkNode::MaxHierarchyDepth + 10;
+        for (int i = 0; i < count; ++i) {
+            const int parent = i + step;
+            node(b).sections = {
+                {0x0102, FileBuilder::pointer(parent < 0 || parent >= count ? 0 : 1, parent)}};
+        }
+        QTest::newRow(step < 0 ? "deep hierarchy" : "deep hierarchy, forward")
+            << b.bytes() << "deeper than";
+    }
     {
         // A node whose parent is itself.
         FileBuilder b;
