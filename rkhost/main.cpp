@@ -1,8 +1,10 @@
+#include "rk3dviewport.h"
 #include "rkaboutplugins.h"
 #include "rkactionmgr.h"
 #include "rkapp.h"
 #include "rkdemoscene.h"
 #include "rkdemotools.h"
+#include "rkgldriver.h"
 #include "rkhostactions.h"
 #include "rkmainwindow.h"
 #include "rkpanemgr.h"
@@ -17,36 +19,14 @@
 #include <QCommandLineParser>
 #include <QDir>
 #include <QFile>
-#include <QLinearGradient>
 #include <QMenu>
-#include <QPainter>
+#include <QScreen>
 #include <QScriptEngine>
 #include <QTimer>
 
 #include <cstdio>
 
 namespace {
-
-// Stands in for the 3D picture until a scene view is set.
-class PlaceholderSceneWidget : public QWidget {
-public:
-    explicit PlaceholderSceneWidget(QWidget* parent = nullptr) : QWidget(parent)
-    {
-        setObjectName(QStringLiteral("SceneView"));
-    }
-
-protected:
-    void paintEvent(QPaintEvent*) override
-    {
-        QPainter p(this);
-        QLinearGradient g(rect().topLeft(), rect().bottomLeft());
-        g.setColorAt(0, QColor(92, 100, 112));
-        g.setColorAt(1, QColor(36, 38, 44));
-        p.fillRect(rect(), g);
-        p.setPen(QColor(200, 200, 200));
-        p.drawText(rect(), Qt::AlignCenter, tr("Main Viewport"));
-    }
-};
 
 // --plugins, then $RK_PLUGIN_PATH, then the installed plug-in folder next to the binary, then the
 // build tree's.
@@ -118,6 +98,7 @@ int main(int argc, char** argv)
         }
     }
 
+    rkKeepGLDriverLoaded();
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("rkhost"));
     QApplication::setOrganizationName(QStringLiteral("rkhost"));
@@ -155,7 +136,10 @@ int main(int argc, char** argv)
 
     RkMainWindow window;
     window.setWindowTitle(QStringLiteral("rkhost"));
-    window.setSceneWidget(new PlaceholderSceneWidget);
+    // The scene is shown in the 3D viewport, framed on the whole scene at start.
+    auto* sceneView = new Rk3DViewport;
+    sceneView->setObjectName(QStringLiteral("SceneView"));
+    window.setSceneWidget(sceneView);
     window.addMenu(QStringLiteral("&File"));
     window.addMenu(QStringLiteral("&Edit"));
     window.addMenu(QStringLiteral("&View"));
@@ -176,6 +160,7 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&Help"));
     window.resize(1280, 800);
     window.show();
+    sceneView->frameCamera();
 
     const QString script = parser.value(QStringLiteral("script"));
     const QString screenshot = parser.value(QStringLiteral("screenshot"));
@@ -191,7 +176,15 @@ int main(int argc, char** argv)
         if (!screenshot.isEmpty()) {
             // Give layouts, docks and posted refreshes time to settle before grabbing.
             QTimer::singleShot(500, &app, [&] {
-                const bool saved = window.grab().save(screenshot, "PNG");
+                // Read back what the display shows: the 3D viewport draws with OpenGL into its
+                // own surface, which a widget grab would leave black. Its picture is drawn and
+                // handed to the display first, so a busy machine cannot leave it out.
+                sceneView->updateGL();
+                QApplication::sync();
+                QImage shot = window.screen()->grabWindow(window.winId()).toImage();
+                if (shot.isNull())
+                    shot = window.grab().toImage();
+                const bool saved = shot.save(screenshot, "PNG");
                 if (!saved)
                     std::fprintf(stderr, "rkhost: cannot write %s\n", qPrintable(screenshot));
                 QCoreApplication::exit(saved ? 0 : 1);

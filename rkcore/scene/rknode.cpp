@@ -5,6 +5,7 @@
 #include "rkfloatproperty.h"
 #include "rkinfile.h"
 #include "rkintproperty.h"
+#include "rkobject.h"
 #include "rkoutfile.h"
 #include "rkpropertygroup.h"
 #include "rkpropertygrouptree.h"
@@ -56,6 +57,7 @@ struct RkNode::Private {
     QString source;
     QPointer<RkFloatProperty> xTrans, yTrans, zTrans, xRot, yRot, zRot, scale;
     QPointer<RkBoolProperty> visible;
+    std::unique_ptr<RkObject> object;
 };
 
 RkNode::RkNode(QObject* parent) : RkElement(parent), d(std::make_unique<Private>())
@@ -97,6 +99,21 @@ RkNode::~RkNode()
         d->parent->d->children.removeAll(this);
         Q_EMIT d->parent->nodeChildrenChanged();
     }
+}
+
+RkObject* RkNode::getObject() const
+{
+    return d->object.get();
+}
+
+void RkNode::setObject(RkObject* object)
+{
+    if (object == d->object.get())
+        return;
+    d->object.reset(object);
+    if (object)
+        object->setElementParent(this);
+    Q_EMIT uvsChanged();
 }
 
 RkSkeleton* RkNode::getSkeleton() const

@@ -8,6 +8,7 @@
 
 class RkFloatProperty;
 class RkBoolProperty;
+class RkObject;
 class RkSkeleton;
 
 // A node of the scene. Every node has a place in the node hierarchy and the transform
@@ -51,6 +52,11 @@ public:
     RkFloatProperty* getZRotate() const;
     RkFloatProperty* getScale() const;
     RkBoolProperty* getVisible() const;
+
+    // The node's geometry and materials, or null. The node owns its object.
+    RkObject* getObject() const;
+    // Replaces the object (the old one is deleted) and emits uvsChanged().
+    void setObject(RkObject* object);
 
     // Names the content the node is built from ("demo:figure"); a scene file stores the key,
     // and the loader asks the builder registered for it (RkScene::registerSourceBuilder) to

@@ -1,5 +1,6 @@
 #include "rkviewport.h"
 
+#include "rk3dviewport.h"
 #include "rkview.h"
 
 #include <QPointer>
@@ -39,6 +40,11 @@ void RkViewport::setViewWidget(QWidget* widget)
 QWidget* RkViewport::getViewWidget() const
 {
     return d->viewWidget;
+}
+
+Rk3DViewport* RkViewport::get3DViewport() const
+{
+    return qobject_cast<Rk3DViewport*>(d->viewWidget.data());
 }
 
 void RkViewport::setView(RkView* view)

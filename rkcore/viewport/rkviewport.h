@@ -6,6 +6,7 @@
 
 #include <memory>
 
+class Rk3DViewport;
 class RkView;
 
 // One viewport: shows its view widget (the 3D picture of the scene) or, for a while, another view
@@ -19,6 +20,8 @@ public:
     // Sets the widget that draws the scene; the previous one is deleted.
     void setViewWidget(QWidget* widget);
     QWidget* getViewWidget() const;
+    // The view widget when it is the 3D picture of the scene, else null.
+    Rk3DViewport* get3DViewport() const;
 
     // Shows the view in place of the view widget; the previous view is deleted. Null brings the
     // view widget back.

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "rkapp.h"
+#include "rkgldriver.h"
 #include "rkmainwindow.h"
 #include "rkstyle.h"
 
@@ -17,6 +18,7 @@
     int main(int argc, char** argv)                                                                \
     {                                                                                              \
         QStandardPaths::setTestModeEnabled(true);                                                  \
+        rkKeepGLDriverLoaded();                                                                    \
         QApplication app(argc, argv);                                                              \
         RkStyle::install();                                                                        \
         RkApp core;                                                                                \

@@ -6,7 +6,8 @@
 #include <QPointer>
 #include <QSignalSpy>
 
-class TestRkApp : public QObject {
+class TestRkApp : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void globalsLiveWithTheApp();
