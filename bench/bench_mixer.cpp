@@ -4,6 +4,7 @@
 // whole move of a mixer during a drag: the weights and the writes to the morphs, each recorded
 // for undo.
 #include "rkapp.h"
+#include "rkbenchmain.h"
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
@@ -105,16 +106,4 @@ BENCHMARK(BM_Drive)->RangeMultiplier(2)->Range(2, 64)->Unit(benchmark::kMicrosec
 
 BENCHMARK(BM_DriveApply)->RangeMultiplier(2)->Range(2, 64)->Unit(benchmark::kMicrosecond);
 
-int main(int argc, char** argv)
-{
-    if (qEnvironmentVariableIsEmpty("DISPLAY"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication app(argc, argv);
-    RkApp core;
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
-}
+RK_BENCHMARK_MAIN(false)

@@ -1,6 +1,7 @@
 // Scene benchmarks: saving and loading the demo scene, deforming and rendering its figure.
 #include "rk3dviewport.h"
 #include "rkapp.h"
+#include "rkbenchmain.h"
 #include "rkbone.h"
 #include "rkdemoscene.h"
 #include "rkfloatproperty.h"
@@ -170,14 +171,4 @@ static void BM_RenderThumbnail(benchmark::State& state)
 }
 BENCHMARK(BM_RenderThumbnail)->Unit(benchmark::kMillisecond);
 
-int main(int argc, char** argv)
-{
-    QApplication app(argc, argv);
-    RkApp core;
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
-        return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
-}
+RK_BENCHMARK_MAIN(true)
