@@ -40,19 +40,6 @@ QString RkBoolProperty::widgetClassName() const
     return QStringLiteral("RkBoolPropertyWgt");
 }
 
-void RkBoolProperty::beginEdit()
-{
-    m_editStart = m_value;
-    RkProperty::beginEdit();
-}
-
-void RkBoolProperty::cancelEdit()
-{
-    if (isEditing())
-        setValue(m_editStart);
-    RkProperty::cancelEdit();
-}
-
 QVariant RkBoolProperty::getValueVariant() const
 {
     return QVariant(m_value);

@@ -16,8 +16,6 @@ public:
     void setDefaultValue(bool value);
 
     QString widgetClassName() const override;
-    void beginEdit() override;
-    void cancelEdit() override;
     QVariant getValueVariant() const override;
     bool setValueVariant(const QVariant& value) override;
     void saveState(RkOutFile* file) const override;
@@ -26,5 +24,4 @@ public:
 private:
     bool m_value = false;
     bool m_default = false;
-    bool m_editStart = false;
 };

@@ -99,19 +99,6 @@ QString RkFloatProperty::widgetClassName() const
     return QStringLiteral("RkFloatPropertyWgt");
 }
 
-void RkFloatProperty::beginEdit()
-{
-    m_editStart = m_value;
-    RkNumericProperty::beginEdit();
-}
-
-void RkFloatProperty::cancelEdit()
-{
-    if (isEditing())
-        setValue(m_editStart);
-    RkNumericProperty::cancelEdit();
-}
-
 QVariant RkFloatProperty::getValueVariant() const
 {
     return QVariant(m_value);

@@ -28,8 +28,6 @@ public:
     void setDisplayAsPercent(bool on);
 
     QString widgetClassName() const override;
-    void beginEdit() override;
-    void cancelEdit() override;
     QVariant getValueVariant() const override;
     bool setValueVariant(const QVariant& value) override;
     void saveState(RkOutFile* file) const override;
@@ -44,6 +42,5 @@ private:
     float m_min = -10000.0f;
     float m_max = 10000.0f;
     float m_sensitivity = 0.01f;
-    float m_editStart = 0.0f;
     bool m_percent = false;
 };

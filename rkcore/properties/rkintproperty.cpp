@@ -64,19 +64,6 @@ QString RkIntProperty::widgetClassName() const
     return QStringLiteral("RkIntPropertyWgt");
 }
 
-void RkIntProperty::beginEdit()
-{
-    m_editStart = m_value;
-    RkNumericProperty::beginEdit();
-}
-
-void RkIntProperty::cancelEdit()
-{
-    if (isEditing())
-        setValue(m_editStart);
-    RkNumericProperty::cancelEdit();
-}
-
 QVariant RkIntProperty::getValueVariant() const
 {
     return QVariant(m_value);

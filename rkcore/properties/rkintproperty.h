@@ -20,8 +20,6 @@ public:
     void setMinMax(int min, int max);
 
     QString widgetClassName() const override;
-    void beginEdit() override;
-    void cancelEdit() override;
     QVariant getValueVariant() const override;
     bool setValueVariant(const QVariant& value) override;
     void saveState(RkOutFile* file) const override;
@@ -32,5 +30,4 @@ private:
     int m_default = 0;
     int m_min = -1000000;
     int m_max = 1000000;
-    int m_editStart = 0;
 };

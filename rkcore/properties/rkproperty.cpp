@@ -13,6 +13,8 @@ struct RkProperty::Private {
     bool globalFavorite = false;
     bool selected = false;
     bool editing = false;
+    // The value beginEdit() found, put back by cancelEdit().
+    QVariant editStart;
     bool refusalLogged = false;
 };
 
@@ -111,6 +113,7 @@ QString RkProperty::widgetClassName() const
 
 void RkProperty::beginEdit()
 {
+    d->editStart = getValueVariant();
     d->editing = true;
 }
 
@@ -121,6 +124,8 @@ void RkProperty::finishEdit()
 
 void RkProperty::cancelEdit()
 {
+    if (d->editing)
+        setValueVariant(d->editStart);
     d->editing = false;
 }
 
