@@ -40,7 +40,9 @@ QPoint driverAt(int64_t step)
     return QPoint(15 + int(step * 7 % 180), 15 + int(step * 13 % 224));
 }
 
-void BM_DriveReference(benchmark::State& state)
+// One move's weights, the system rebuilt for the layout as a drag does it, by the given way.
+template <typename Weights>
+void driveWeights(benchmark::State& state, Weights weightsOf)
 {
     const QVector<QPoint> points = scatter(int(state.range(0)));
     RkEzMixerSolver solver;
@@ -48,22 +50,23 @@ void BM_DriveReference(benchmark::State& state)
     int64_t step = 0;
     for (auto _ : state) {
         solver.setPoints(points);
-        benchmark::DoNotOptimize(solver.referenceWeights(driverAt(step++), weights));
+        benchmark::DoNotOptimize(weightsOf(solver, driverAt(step++), weights));
         benchmark::ClobberMemory();
     }
 }
 
+void BM_DriveReference(benchmark::State& state)
+{
+    driveWeights(state, [](RkEzMixerSolver& solver, const QPoint& driver, QVector<float>& weights) {
+        return solver.referenceWeights(driver, weights);
+    });
+}
+
 void BM_Drive(benchmark::State& state)
 {
-    const QVector<QPoint> points = scatter(int(state.range(0)));
-    RkEzMixerSolver solver;
-    QVector<float> weights;
-    int64_t step = 0;
-    for (auto _ : state) {
-        solver.setPoints(points);
-        benchmark::DoNotOptimize(solver.weights(driverAt(step++), weights));
-        benchmark::ClobberMemory();
-    }
+    driveWeights(state, [](RkEzMixerSolver& solver, const QPoint& driver, QVector<float>& weights) {
+        return solver.weights(driver, weights);
+    });
 }
 
 void BM_DriveApply(benchmark::State& state)
