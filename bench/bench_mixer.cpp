@@ -3,15 +3,15 @@
 // control, and the way the mixer does it, one factorisation per move. BM_DriveApply times a
 // whole move of a mixer during a drag: the weights and the writes to the morphs, each recorded
 // for undo.
-#include "rkapp.h"
+#include "app/rkapp.h"
 #include "rkbenchmain.h"
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixersolver.h"
-#include "rkfloatproperty.h"
-#include "rkskeleton.h"
-#include "rkundostackhold.h"
+#include "properties/rkfloatproperty.h"
+#include "scene/rkskeleton.h"
+#include "undo/rkundostackhold.h"
 
 #include <QApplication>
 #include <QRandomGenerator>

@@ -1,16 +1,16 @@
 // Scene benchmarks: saving and loading the demo scene, deforming and rendering its figure.
-#include "rk3dviewport.h"
-#include "rkapp.h"
+#include "render/rk3dviewport.h"
+#include "app/rkapp.h"
 #include "rkbenchmain.h"
-#include "rkbone.h"
-#include "rkdemoscene.h"
-#include "rkfloatproperty.h"
-#include "rkimagerenderhandler.h"
-#include "rkobject.h"
-#include "rkscene.h"
-#include "rkscenefile.h"
-#include "rkskeleton.h"
-#include "rkundostackhold.h"
+#include "scene/rkbone.h"
+#include "demo/rkdemoscene.h"
+#include "properties/rkfloatproperty.h"
+#include "render/rkimagerenderhandler.h"
+#include "scene/rkobject.h"
+#include "scene/rkscene.h"
+#include "scene/rkscenefile.h"
+#include "scene/rkskeleton.h"
+#include "undo/rkundostackhold.h"
 
 #include <QApplication>
 

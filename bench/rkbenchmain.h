@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkapp.h"
+#include "app/rkapp.h"
 
 #include <QApplication>
 

@@ -1,9 +1,9 @@
 // Feeds arbitrary bytes to the scene loader. The checksum is not verified, so the fuzzer reaches
 // the structure checks behind it. Whatever loads is deleted again; nothing may crash or leak.
-#include "rkapp.h"
-#include "rkdemoscene.h"
-#include "rkscene.h"
-#include "rkscenefile.h"
+#include "app/rkapp.h"
+#include "demo/rkdemoscene.h"
+#include "scene/rkscene.h"
+#include "scene/rkscenefile.h"
 
 #include <QApplication>
 

@@ -1,8 +1,8 @@
 #include "rkaboutplugins.h"
 
-#include "rkclassfactory.h"
-#include "rkplugin.h"
-#include "rkpluginmgr.h"
+#include "plugin/rkclassfactory.h"
+#include "plugin/rkplugin.h"
+#include "plugin/rkpluginmgr.h"
 
 #include <QDialogButtonBox>
 #include <QHeaderView>

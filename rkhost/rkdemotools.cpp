@@ -1,11 +1,11 @@
 #include "rkdemotools.h"
 
-#include "rkaction.h"
-#include "rkactionmenu.h"
-#include "rkactionmgr.h"
-#include "rkapp.h"
-#include "rkviewportmgr.h"
-#include "rkviewtool.h"
+#include "actions/rkaction.h"
+#include "actions/rkactionmenu.h"
+#include "actions/rkactionmgr.h"
+#include "app/rkapp.h"
+#include "viewport/rkviewportmgr.h"
+#include "viewport/rkviewtool.h"
 
 #include <QCheckBox>
 #include <QDoubleSpinBox>

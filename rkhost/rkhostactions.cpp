@@ -1,10 +1,10 @@
 #include "rkhostactions.h"
 
 #include "rkaboutplugins.h"
-#include "rkaction.h"
-#include "rkactionmgr.h"
-#include "rkapp.h"
-#include "rkmainwindow.h"
+#include "actions/rkaction.h"
+#include "actions/rkactionmgr.h"
+#include "app/rkapp.h"
+#include "app/rkmainwindow.h"
 
 namespace {
 

@@ -1,8 +1,8 @@
 #include "rkscenelist.h"
 
-#include "rkmainwindow.h"
-#include "rknode.h"
-#include "rkscene.h"
+#include "app/rkmainwindow.h"
+#include "scene/rknode.h"
+#include "scene/rkscene.h"
 
 #include <QDockWidget>
 #include <QHash>

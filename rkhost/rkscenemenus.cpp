@@ -1,9 +1,9 @@
 #include "rkscenemenus.h"
 
-#include "rkapp.h"
-#include "rkmainwindow.h"
-#include "rkscene.h"
-#include "rkundostack.h"
+#include "app/rkapp.h"
+#include "app/rkmainwindow.h"
+#include "scene/rkscene.h"
+#include "undo/rkundostack.h"
 
 #include <QAction>
 #include <QFileDialog>

@@ -4,9 +4,9 @@
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixersolver.h"
-#include "rkfloatproperty.h"
-#include "rkinfile.h"
-#include "rkoutfile.h"
+#include "properties/rkfloatproperty.h"
+#include "io/rkinfile.h"
+#include "io/rkoutfile.h"
 
 #include <cmath>
 

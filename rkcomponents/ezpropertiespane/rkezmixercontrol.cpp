@@ -1,9 +1,9 @@
 #include "rkezmixercontrol.h"
 
 #include "rkassertcast.h"
-#include "rkfloatproperty.h"
-#include "rkinfile.h"
-#include "rkoutfile.h"
+#include "properties/rkfloatproperty.h"
+#include "io/rkinfile.h"
+#include "io/rkoutfile.h"
 
 #include <QBuffer>
 #include <QPointer>

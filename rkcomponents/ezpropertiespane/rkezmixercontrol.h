@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkbase.h"
+#include "io/rkbase.h"
 
 #include <QImage>
 #include <QPoint>

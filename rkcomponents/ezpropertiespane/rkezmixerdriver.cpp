@@ -1,8 +1,8 @@
 #include "rkezmixerdriver.h"
 
-#include "rkinfile.h"
-#include "rkoutfile.h"
-#include "rkundostackhold.h"
+#include "io/rkinfile.h"
+#include "io/rkoutfile.h"
+#include "undo/rkundostackhold.h"
 
 namespace {
 constexpr short kPointSection = 0x231;

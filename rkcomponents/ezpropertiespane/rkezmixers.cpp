@@ -2,8 +2,8 @@
 
 #include "rkassertcast.h"
 #include "rkezmixer.h"
-#include "rkinfile.h"
-#include "rkoutfile.h"
+#include "io/rkinfile.h"
+#include "io/rkoutfile.h"
 
 namespace {
 constexpr short kMixersSection = 0x210;

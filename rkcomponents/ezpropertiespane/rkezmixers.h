@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkelementdata.h"
+#include "scene/rkelementdata.h"
 
 #include <QVector>
 

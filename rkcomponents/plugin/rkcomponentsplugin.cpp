@@ -6,7 +6,7 @@
 #include "rkezmixers.h"
 #include "rkfullscreenaction.h"
 #include "rkfullscreenactionfactory.h"
-#include "rkplugin.h"
+#include "plugin/rkplugin.h"
 #include "rktclassfactory.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"

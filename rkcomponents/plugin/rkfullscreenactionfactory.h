@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkclassfactory.h"
+#include "plugin/rkclassfactory.h"
 
 // Makes RkFullScreenAction. The action is not made known to the script engine.
 class RkFullScreenActionFactory : public RkClassFactory {

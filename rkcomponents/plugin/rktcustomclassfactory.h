@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkclassfactory.h"
+#include "plugin/rkclassfactory.h"
 
 #include <QByteArray>
 #include <QMetaType>

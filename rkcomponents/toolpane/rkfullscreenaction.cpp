@@ -1,7 +1,7 @@
 #include "rkfullscreenaction.h"
 
-#include "rkapp.h"
-#include "rkmainwindow.h"
+#include "app/rkapp.h"
+#include "app/rkmainwindow.h"
 
 RkFullScreenAction::RkFullScreenAction()
     : RkAction(tr("Go Full Screen"), tr("Make the main viewport Full Screen"))

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkaction.h"
+#include "actions/rkaction.h"
 
 // View > Go Full Screen: asks the main window to let the main viewport fill the screen.
 class RkFullScreenAction : public RkAction {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkactionmenu.h"
+#include "actions/rkactionmenu.h"
 
 #include <QPointer>
 

@@ -1,10 +1,10 @@
 #include "rktoolpane.h"
 
-#include "rkapp.h"
-#include "rkmainwindow.h"
+#include "app/rkapp.h"
+#include "app/rkmainwindow.h"
 #include "rktoolactionmenu.h"
-#include "rkviewportmgr.h"
-#include "rkviewtool.h"
+#include "viewport/rkviewportmgr.h"
+#include "viewport/rkviewtool.h"
 
 #include <QLabel>
 #include <QPointer>

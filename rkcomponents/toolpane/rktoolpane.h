@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkpane.h"
+#include "panes/rkpane.h"
 
 #include <memory>
 

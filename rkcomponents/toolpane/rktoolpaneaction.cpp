@@ -1,7 +1,7 @@
 #include "rktoolpaneaction.h"
 
-#include "rkapp.h"
-#include "rkhelpmgr.h"
+#include "app/rkapp.h"
+#include "actions/rkhelpmgr.h"
 
 RkToolPaneAction::RkToolPaneAction() : RkPaneAction(QStringLiteral("RkToolPane"))
 {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "rkpaneaction.h"
+#include "panes/rkpaneaction.h"
 
 // Shows and hides the Tool tab.
 class RkToolPaneAction : public RkPaneAction {

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "rkclassfactory.h"
-#include "rkguid.h"
+#include "plugin/rkclassfactory.h"
+#include "plugin/rkguid.h"
 
 // A class factory for test classes: makes T with its parameterless constructor.
 template <typename T>

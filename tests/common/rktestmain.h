@@ -1,9 +1,9 @@
 #pragma once
 
-#include "rkapp.h"
-#include "rkgldriver.h"
-#include "rkmainwindow.h"
-#include "rkstyle.h"
+#include "app/rkapp.h"
+#include "support/rkgldriver.h"
+#include "app/rkmainwindow.h"
+#include "app/rkstyle.h"
 
 #include <QApplication>
 #include <QStandardPaths>

@@ -1,14 +1,14 @@
-#include "rkbone.h"
-#include "rkdemoscene.h"
-#include "rkfloatproperty.h"
-#include "rkmainwindow.h"
-#include "rkscene.h"
+#include "scene/rkbone.h"
+#include "demo/rkdemoscene.h"
+#include "properties/rkfloatproperty.h"
+#include "app/rkmainwindow.h"
+#include "scene/rkscene.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
-#include "rkskeleton.h"
+#include "scene/rkskeleton.h"
 #include "rktestmain.h"
-#include "rkundostack.h"
-#include "rkundostackhold.h"
+#include "undo/rkundostack.h"
+#include "undo/rkundostackhold.h"
 
 #include <QAction>
 #include <QMessageBox>

@@ -3,16 +3,18 @@
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
 
-#include "rkapp.h"
+#include "app/rkapp.h"
 #include "rkcomponentsplugin.h"
-#include "rkfloatproperty.h"
-#include "rkoutfile.h"
-#include "rkpluginmgr.h"
-#include "rkscene.h"
-#include "rkskeleton.h"
-#include "rkstoredclasses.h"
+#include "properties/rkfloatproperty.h"
+#include "io/rkoutfile.h"
+#include "plugin/rkpluginmgr.h"
+#include "scene/rkscene.h"
+#include "scene/rkskeleton.h"
+#include "plugin/rkclassfactory.h"
+#include "plugin/rkguid.h"
+#include "plugin/rkpluginmgr.h"
 #include "rktestmain.h"
-#include "rkundostack.h"
+#include "undo/rkundostack.h"
 
 #include <QPainter>
 #include <QPointer>
@@ -113,6 +115,17 @@ public:
 
 private:
     RkBase* m_target;
+};
+
+// Saves an Impostor under its own GUID and makes a real mixer list from it on load.
+class ImpostorFactory : public RkClassFactory {
+public:
+    ImpostorFactory()
+        : RkClassFactory(&Impostor::staticMetaObject,
+                         RkGUID::fromString(QStringLiteral("6a0f3c2e-0000-4000-8000-000000000001")))
+    {
+    }
+    QObject* createInstance() override { return new RkEzMixers; }
 };
 
 } // namespace
@@ -346,8 +359,8 @@ void TestRkEzMixer::wrongClassIsRefused()
     QVERIFY(mixer.getDriver() && mixer.getControls().isEmpty() && mixers.getMixers().isEmpty());
 
     // In a file, the load fails with that message and the open scene stays as it was.
-    rkRegisterStoredClass(QStringLiteral("6a0f3c2e-0000-4000-8000-000000000001"),
-                          &Impostor::staticMetaObject, [] { return new RkEzMixers; });
+    static ImpostorFactory impostorFactory;
+    QVERIFY(rkApp->getPluginMgr()->addClassFactory(&impostorFactory));
     RkSkeleton* figure = makeFigure(1);
     figure->addDataItem(new Impostor(new RkEzMixerControl));
     rkScene->addNode(figure);

@@ -1,5 +1,5 @@
-#include "rkclassfactory.h"
-#include "rkplugin.h"
+#include "plugin/rkclassfactory.h"
+#include "plugin/rkplugin.h"
 #include "rktestmain.h"
 
 #include <QFile>

@@ -1,9 +1,9 @@
-#include "rkactionmgr.h"
+#include "actions/rkactionmgr.h"
 #include "rkcomponentsplugin.h"
 #include "rkfullscreenaction.h"
-#include "rkpluginmgr.h"
+#include "plugin/rkpluginmgr.h"
 #include "rktestmain.h"
-#include "rkviewport.h"
+#include "viewport/rkviewport.h"
 
 #include <QDockWidget>
 #include <QMenuBar>

@@ -1,14 +1,14 @@
-#include "rkaction.h"
-#include "rkactionmenu.h"
-#include "rkactionmgr.h"
+#include "actions/rkaction.h"
+#include "actions/rkactionmenu.h"
+#include "actions/rkactionmgr.h"
 #include "rkcomponentsplugin.h"
-#include "rkpanemgr.h"
-#include "rkpluginmgr.h"
+#include "panes/rkpanemgr.h"
+#include "plugin/rkpluginmgr.h"
 #include "rktestmain.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
-#include "rkviewportmgr.h"
-#include "rkviewtool.h"
+#include "viewport/rkviewportmgr.h"
+#include "viewport/rkviewtool.h"
 
 #include <QDockWidget>
 #include <QLabel>

@@ -1,0 +1,174 @@
+#include "properties/rkproperty.h"
+
+#include "io/rkinfile.h"
+#include "log/rklog.h"
+#include "undo/rkundostack.h"
+
+struct RkProperty::Private {
+    QString label;
+    QString path;
+    bool hidden = false;
+    bool favorite = false;
+    bool globalFavorite = false;
+    bool selected = false;
+    bool editing = false;
+    // The value beginEdit() found, put back by cancelEdit().
+    QVariant editStart;
+    bool refusalLogged = false;
+};
+
+RkProperty::RkProperty(const QString& name, const QString& label, QObject* parent)
+    : RkBase(parent, name), d(std::make_unique<Private>())
+{
+    d->label = label;
+}
+
+RkProperty::~RkProperty() = default;
+
+QString RkProperty::getLabel() const
+{
+    return d->label;
+}
+
+void RkProperty::setLabel(const QString& label)
+{
+    if (label == d->label)
+        return;
+    d->label = label;
+    Q_EMIT labelChanged(label);
+}
+
+QString RkProperty::getPath() const
+{
+    return d->path;
+}
+
+void RkProperty::setPath(const QString& path)
+{
+    d->path = path;
+}
+
+bool RkProperty::isHidden() const
+{
+    return d->hidden;
+}
+
+void RkProperty::setHidden(bool hidden)
+{
+    if (hidden == d->hidden)
+        return;
+    d->hidden = hidden;
+    Q_EMIT flagsChanged();
+}
+
+bool RkProperty::isFavorite() const
+{
+    return d->favorite;
+}
+
+void RkProperty::setIsFavorite(bool on)
+{
+    if (on == d->favorite)
+        return;
+    d->favorite = on;
+    Q_EMIT flagsChanged();
+}
+
+bool RkProperty::isGlobalFavorite() const
+{
+    return d->globalFavorite;
+}
+
+void RkProperty::setIsGlobalFavorite(bool on)
+{
+    if (on == d->globalFavorite)
+        return;
+    d->globalFavorite = on;
+    Q_EMIT flagsChanged();
+}
+
+bool RkProperty::isSelected() const
+{
+    return d->selected;
+}
+
+void RkProperty::setSelected(bool on)
+{
+    if (on == d->selected)
+        return;
+    d->selected = on;
+    Q_EMIT selectedChanged(on);
+}
+
+QString RkProperty::widgetClassName() const
+{
+    return QStringLiteral("RkLabelPropertyWgt");
+}
+
+void RkProperty::beginEdit()
+{
+    d->editStart = getValueVariant();
+    d->editing = true;
+}
+
+void RkProperty::finishEdit()
+{
+    d->editing = false;
+}
+
+void RkProperty::cancelEdit()
+{
+    if (d->editing)
+        setValueVariant(d->editStart);
+    d->editing = false;
+}
+
+bool RkProperty::isEditing() const
+{
+    return d->editing;
+}
+
+QVariant RkProperty::getValueVariant() const
+{
+    return QVariant();
+}
+
+bool RkProperty::setValueVariant(const QVariant&)
+{
+    return false;
+}
+
+int RkProperty::getFlags() const
+{
+    return (d->hidden ? Hidden : 0) | (d->favorite ? Favorite : 0) |
+           (d->globalFavorite ? GlobalFavorite : 0);
+}
+
+void RkProperty::setFlags(int flags)
+{
+    setHidden(flags & Hidden);
+    setIsFavorite(flags & Favorite);
+    setIsGlobalFavorite(flags & GlobalFavorite);
+}
+
+void RkProperty::saveState(RkOutFile*) const {}
+
+void RkProperty::loadState(RkInFile*) {}
+
+void RkProperty::valueChanged(const QVariant& oldValue)
+{
+    if (rkUndoStack)
+        rkUndoStack->recordPropertyChange(this, oldValue, getValueVariant());
+    Q_EMIT currentValueChanged();
+}
+
+void RkProperty::logRefusedValue(const QString& what)
+{
+    if (d->refusalLogged)
+        return;
+    d->refusalLogged = true;
+    const QString message = QStringLiteral("Property \"%1\" refused the value %2; it keeps its "
+                                           "value")
+                                .arg(getName(), what);
+    rkLog(message);
+}

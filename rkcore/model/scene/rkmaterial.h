@@ -1,0 +1,50 @@
+#pragma once
+
+#include "scene/rkelement.h"
+
+#include <QColor>
+#include <QListIterator>
+
+#include <memory>
+
+class RkShape;
+
+// A surface material. Every material alive is listed, in creation order, by the static
+// getNumMaterials()/getMaterial(); the shapes that use it are listed by shapeListIterator().
+// Materials are selected apart from nodes; the scene emits materialSelectionChanged() once for
+// each change of that selection.
+class RKCORE_EXPORT RkMaterial : public RkElement
+{
+    Q_OBJECT
+public:
+    explicit RkMaterial(const QString& name, QObject* parent = nullptr);
+    ~RkMaterial() override;
+
+    static int getNumMaterials();
+    // Null for an index out of range.
+    static RkMaterial* getMaterial(int index);
+    static QList<RkMaterial*> getSelectedMaterials();
+    static void clearMaterialSelection();
+
+    bool isSelected() const;
+    void setSelected(bool selected);
+
+    QColor getDiffuseColor() const;
+    void setDiffuseColor(const QColor& colour);
+
+    // The shapes that use the material, in the order they took it up.
+    QListIterator<RkShape*> shapeListIterator() const;
+    QList<RkShape*> getShapes() const;
+
+Q_SIGNALS:
+    void uvsChanged();
+    void diffuseColorChanged();
+
+private:
+    friend class RkShape;
+    void addShape(RkShape* shape);
+    void removeShape(RkShape* shape);
+
+    struct Private;
+    std::unique_ptr<Private> d;
+};
