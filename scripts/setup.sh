@@ -7,7 +7,7 @@ packages=(
   build-essential cmake ninja-build pkg-config
   qtbase5-dev qtscript5-dev libqt5opengl5-dev libglu1-mesa-dev
   xvfb xauth libgl1-mesa-dri
-  libbenchmark-dev
+  libbenchmark-dev clang-format
 )
 
 missing=()
