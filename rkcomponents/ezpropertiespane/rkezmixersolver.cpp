@@ -97,11 +97,6 @@ void solve(const double* a, int n, const int* index, double* b, double* x)
 
 RkEzMixerSolver::RkEzMixerSolver() = default;
 
-RkEzMixerSolver::RkEzMixerSolver(const QVector<QPoint>& points)
-{
-    setPoints(points);
-}
-
 RkEzMixerSolver::Layout RkEzMixerSolver::classify(const QVector<QPoint>& points)
 {
     const int n = points.size();

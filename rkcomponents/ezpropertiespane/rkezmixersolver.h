@@ -20,7 +20,7 @@ public:
     };
 
     RkEzMixerSolver();
-    explicit RkEzMixerSolver(const QVector<QPoint>& points);
+    explicit RkEzMixerSolver(const QVector<QPoint>& points) { setPoints(points); }
 
     // Takes a new set of control points and builds the interpolation system for them.
     void setPoints(const QVector<QPoint>& points);
