@@ -8,6 +8,7 @@
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
+#include "rkezmixerreference.h"
 #include "rkezmixersolver.h"
 #include "properties/rkfloatproperty.h"
 #include "scene/rkskeleton.h"
@@ -58,7 +59,7 @@ void driveWeights(benchmark::State& state, Weights weightsOf)
 void BM_DriveReference(benchmark::State& state)
 {
     driveWeights(state, [](RkEzMixerSolver& solver, const QPoint& driver, QVector<float>& weights) {
-        return solver.referenceWeights(driver, weights);
+        return rkEzMixerReferenceWeights(solver, driver, weights);
     });
 }
 

@@ -97,11 +97,6 @@ void solve(const double* a, int n, const int* index, double* b, double* x)
 
 RkEzMixerSolver::RkEzMixerSolver() = default;
 
-RkEzMixerSolver::RkEzMixerSolver(const QVector<QPoint>& points)
-{
-    setPoints(points);
-}
-
 RkEzMixerSolver::Layout RkEzMixerSolver::classify(const QVector<QPoint>& points)
 {
     const int n = points.size();
@@ -196,36 +191,5 @@ bool RkEzMixerSolver::weights(const QPoint& driver, QVector<float>& weights)
     weights.resize(m_count);
     for (int i = 0; i < m_count; ++i)
         weights[i] = float(x[i]);
-    return true;
-}
-
-bool RkEzMixerSolver::referenceWeights(const QPoint& driver, QVector<float>& weights) const
-{
-    if (m_layout == None)
-        return false;
-    const int n = m_count;
-    const int k = m_size;
-    const size_t size = size_t(k);
-    std::vector<double> a, scale(size), b(size), c(size), phi;
-    std::vector<int> index(size);
-    evaluateBasis(driver, phi);
-
-    QVector<float> result(n);
-    for (int control = 0; control < n; ++control) {
-        a = m_matrix;
-        if (!decompose(a.data(), k, index.data(), scale.data()))
-            return false;
-        std::fill(b.begin(), b.end(), 0.0);
-        b[size_t(control)] = 1.0;
-        solve(a.data(), k, index.data(), b.data(), c.data());
-
-        float w = 0.f;
-        for (int i = 0; i < k; ++i)
-            w += c[i] * phi[i];
-        if (!std::isfinite(w))
-            return false;
-        result[control] = w;
-    }
-    weights = result;
     return true;
 }

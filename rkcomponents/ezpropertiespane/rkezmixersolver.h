@@ -20,7 +20,7 @@ public:
     };
 
     RkEzMixerSolver();
-    explicit RkEzMixerSolver(const QVector<QPoint>& points);
+    explicit RkEzMixerSolver(const QVector<QPoint>& points) { setPoints(points); }
 
     // Takes a new set of control points and builds the interpolation system for them.
     void setPoints(const QVector<QPoint>& points);
@@ -28,6 +28,7 @@ public:
     Layout layout() const { return m_layout; }
     int controlCount() const { return m_count; }
     int systemSize() const { return m_size; }
+    const QVector<QPoint>& points() const { return m_points; }
     // Row-major system matrix, systemSize() squared.
     const std::vector<double>& matrix() const { return m_matrix; }
 
@@ -36,11 +37,6 @@ public:
     // solution of A w = phi(driver). Returns false, and leaves weights untouched, when there is
     // nothing to interpolate or the system is singular or the result is not finite.
     bool weights(const QPoint& driver, QVector<float>& weights);
-
-    // The same weights the long way round: one elimination per control for its coefficients,
-    // then the interpolant evaluated at the driver with the sum kept in single precision. Kept to
-    // check the fast path against and to measure it by.
-    bool referenceWeights(const QPoint& driver, QVector<float>& weights) const;
 
     // Whether the points count as lying on one line (every point within a small angle of the
     // direction from the first point to the second).
