@@ -41,13 +41,13 @@ void RkEzMixerDriver::startDrag()
     // user has been looking at its values.
     if (d->hold)
         endDrag();
-    d->hold.reset(new RkUndoStackHold);
-    emit dragStarted();
+    d->hold = std::make_unique<RkUndoStackHold>();
+    Q_EMIT dragStarted();
 }
 
 void RkEzMixerDriver::endDrag()
 {
-    emit dragEnded();
+    Q_EMIT dragEnded();
     if (d->hold) {
         d->hold->accept(QStringLiteral("Shape Mixing"));
         d->hold.reset();
@@ -63,7 +63,7 @@ void RkEzMixerDriver::moveTo(int x, int y)
 {
     d->x = x;
     d->y = y;
-    emit moved(QPoint(x, y));
+    Q_EMIT moved(QPoint(x, y));
 }
 
 void RkEzMixerDriver::loadSection(RkInFile* file, short sectionId)
