@@ -3,6 +3,7 @@
 #include "rkapp.h"
 #include "rkelement.h"
 #include "rkinfile.h"
+#include "rkpropertychangecommand.h"
 #include "rkundostack.h"
 
 struct RkProperty::Private {
@@ -163,8 +164,10 @@ void RkProperty::loadState(RkInFile*) {}
 
 void RkProperty::valueChanged(const QVariant& oldValue)
 {
-    if (rkUndoStack)
-        rkUndoStack->recordPropertyChange(this, oldValue, getValueVariant());
+    // Only changes made inside a hold are undoable; anything else stays unrecorded.
+    if (rkUndoStack && rkUndoStack->canPushItems())
+        rkUndoStack->push(
+            std::make_unique<RkPropertyChangeCommand>(this, oldValue, getValueVariant()));
     Q_EMIT currentValueChanged();
 }
 
