@@ -67,6 +67,8 @@ struct RkUndoStack::Private {
     int nextId = 1;
     QString innerCaption;
     bool applying = false;
+    // A clear() asked for by a command while it was applied waits until the entry is done.
+    bool clearRequested = false;
 
     void apply(const Commands& commands, bool backwards)
     {
@@ -79,6 +81,11 @@ struct RkUndoStack::Private {
                 c->redo();
         }
         applying = false;
+        if (clearRequested) {
+            clearRequested = false;
+            entries.clear();
+            index = 0;
+        }
     }
 };
 
@@ -210,7 +217,7 @@ void RkUndoStack::addEntry(const QString& caption, Commands commands)
 
 void RkUndoStack::undo()
 {
-    if (canPushItems() || !canUndo())
+    if (d->applying || canPushItems() || !canUndo())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
     const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
@@ -221,7 +228,7 @@ void RkUndoStack::undo()
 
 void RkUndoStack::redo()
 {
-    if (canPushItems() || !canRedo())
+    if (d->applying || canPushItems() || !canRedo())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
     const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
@@ -232,6 +239,10 @@ void RkUndoStack::redo()
 
 void RkUndoStack::clear()
 {
+    if (d->applying) {
+        d->clearRequested = true;
+        return;
+    }
     if (d->entries.empty())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();

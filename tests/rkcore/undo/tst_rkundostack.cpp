@@ -50,6 +50,26 @@ class OtherSetInt : public SetInt
     using SetInt::SetInt;
 };
 
+// While the stack applies it: pushes a command, and clears the history if asked to.
+class Meddler : public RkUndoCommand
+{
+public:
+    Meddler(int* target, bool clears) : m_target(target), m_clears(clears) {}
+    void undo() override { meddle(); }
+    void redo() override { meddle(); }
+
+private:
+    void meddle()
+    {
+        rkUndoStack->push(std::make_unique<SetInt>(m_target, 0, 1, &m_log));
+        if (m_clears)
+            rkUndoStack->clear();
+    }
+    int* m_target;
+    bool m_clears;
+    QStringList m_log;
+};
+
 } // namespace
 
 class TestRkUndoStack : public QObject
@@ -67,6 +87,7 @@ private Q_SLOTS:
     void pushedCommandsJoinTheHold();
     void pushWithoutHoldIsAnEntryOfItsOwn();
     void commandsFoldThroughTheirKey();
+    void commandsCannotChangeTheStackWhileApplied();
 
 private:
     RkNode* node = nullptr;
@@ -401,6 +422,35 @@ void TestRkUndoStack::commandsFoldThroughTheirKey()
         hold.accept(QStringLiteral("Back"));
     }
     QCOMPARE(rkUndoStack->count(), before);
+}
+
+void TestRkUndoStack::commandsCannotChangeTheStackWhileApplied()
+{
+    int x = 0;
+    rkUndoStack->push(std::make_unique<Meddler>(&x, false));
+    rkUndoStack->undo();
+    QCOMPARE(rkUndoStack->count(), 1);
+    rkUndoStack->redo();
+    QCOMPARE(rkUndoStack->count(), 1);
+    QVERIFY(!rkUndoStack->canRedo());
+    {
+        RkUndoStackHold outer;
+        {
+            RkUndoStackHold inner;
+            rkUndoStack->push(std::make_unique<Meddler>(&x, false));
+        }
+        outer.accept(QStringLiteral("Cancelled"));
+    }
+    QCOMPARE(rkUndoStack->count(), 1);
+
+    // A clear asked for while undoing happens once the entry is undone.
+    QSignalSpy canUndo(rkUndoStack, &RkUndoStack::canUndoChanged);
+    rkUndoStack->push(std::make_unique<Meddler>(&x, true));
+    rkUndoStack->undo();
+    QCOMPARE(rkUndoStack->count(), 0);
+    QVERIFY(!rkUndoStack->canRedo());
+    QCOMPARE(canUndo.count(), 1);
+    QVERIFY(!canUndo.last().at(0).toBool());
 }
 
 RK_TEST_MAIN(TestRkUndoStack)
