@@ -1,5 +1,6 @@
 #include "rkelement.h"
 #include "rkfloatproperty.h"
+#include "rkintproperty.h"
 #include "rkpropertygroup.h"
 #include "rkpropertygrouptree.h"
 #include "rktestmain.h"

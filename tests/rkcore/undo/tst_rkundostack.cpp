@@ -1,12 +1,15 @@
+#include "rkapp.h"
 #include "rkcamera.h"
 #include "rkfloatproperty.h"
+#include "rkintproperty.h"
 #include "rkscene.h"
 #include "rktestmain.h"
-#include "rkundocommand.h"
 #include "rkundostack.h"
 #include "rkundostackhold.h"
 
 #include <QSignalSpy>
+
+#include <limits>
 
 namespace
 {
