@@ -2,6 +2,7 @@
 
 #include "io/rkinfile.h"
 #include "log/rklog.h"
+#include "properties/rkpropertychangecommand.h"
 #include "undo/rkundostack.h"
 
 struct RkProperty::Private {
@@ -157,8 +158,10 @@ void RkProperty::loadState(RkInFile*) {}
 
 void RkProperty::valueChanged(const QVariant& oldValue)
 {
-    if (rkUndoStack)
-        rkUndoStack->recordPropertyChange(this, oldValue, getValueVariant());
+    // Only changes made inside a hold are undoable; anything else stays unrecorded.
+    if (rkUndoStack && rkUndoStack->canPushItems())
+        rkUndoStack->push(
+            std::make_unique<RkPropertyChangeCommand>(this, oldValue, getValueVariant()));
     Q_EMIT currentValueChanged();
 }
 

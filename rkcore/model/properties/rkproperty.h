@@ -62,7 +62,8 @@ Q_SIGNALS:
     void selectedChanged(bool on);
 
 protected:
-    // Call after the value changed: records the change for undo and emits currentValueChanged().
+    // Call after the value changed: records the change in the open undo hold, if any, and emits
+    // currentValueChanged().
     void valueChanged(const QVariant& oldValue);
     // Logs a refused value, once per property.
     void logRefusedValue(const QString& what);

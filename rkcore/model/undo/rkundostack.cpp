@@ -1,46 +1,57 @@
 #include "undo/rkundostack.h"
 
-#include "properties/rkproperty.h"
-
 #include <QHash>
-#include <QPointer>
+#include <QPair>
 #include <QVector>
+
+#include <algorithm>
+#include <iterator>
+#include <typeinfo>
 
 RkUndoStack* rkUndoStack = nullptr;
 
 namespace
 {
 
-struct Change {
-    QPointer<RkProperty> property;
-    QVariant before;
-    QVariant after;
-};
+using Commands = std::vector<std::unique_ptr<RkUndoCommand>>;
 
 struct Entry {
     QString caption;
-    QVector<Change> changes;
+    Commands commands;
 };
 
-// One change per property: the value before the first change and after the last. Properties
-// that came back to where they started drop out.
-QVector<Change> compress(const QVector<Change>& changes)
+// Folds the commands of one gesture: a command takes in the later ones of its class and key, and
+// those that end up changing nothing drop out. Folding never reorders what depends on order: it
+// stops at a command that never merges, and at a command of another class with the same key.
+Commands fold(Commands commands)
 {
-    QVector<Change> out;
-    QHash<const RkProperty*, int> seen; // a hold on a big rig may touch thousands
-    for (const Change& c : changes) {
-        if (!c.property)
+    Commands out;
+    out.reserve(commands.size());
+    QHash<const void*, size_t> last; // where each key went; a hold on a big rig records thousands
+    for (std::unique_ptr<RkUndoCommand>& c : commands) {
+        const RkUndoCommand& command = *c;
+        const void* key = command.mergeKey();
+        if (!key) {
+            if (command.isNoChange())
+                continue;
+            last.clear();
+            out.push_back(std::move(c));
             continue;
-        const auto it = seen.constFind(c.property.data());
-        if (it == seen.constEnd()) {
-            seen.insert(c.property.data(), out.size());
-            out.append(c);
-        } else {
-            out[*it].after = c.after;
         }
+        const auto it = last.constFind(key);
+        if (it != last.constEnd()) {
+            RkUndoCommand& first = *out[*it];
+            if (typeid(first) == typeid(command)) {
+                first.mergeWith(command);
+                continue;
+            }
+        }
+        last.insert(key, out.size());
+        out.push_back(std::move(c));
     }
     out.erase(
-        std::remove_if(out.begin(), out.end(), [](const Change& c) { return c.before == c.after; }),
+        std::remove_if(out.begin(), out.end(),
+                       [](const std::unique_ptr<RkUndoCommand>& c) { return c->isNoChange(); }),
         out.end());
     return out;
 }
@@ -48,30 +59,33 @@ QVector<Change> compress(const QVector<Change>& changes)
 } // namespace
 
 struct RkUndoStack::Private {
-    QVector<Entry> entries;
+    std::vector<Entry> entries;
     int index = 0; // entries below index are done, the rest can be redone
-    QVector<Change> pending;
+    Commands pending;
     // The open holds, outermost first: their id and pending.size() when they were opened.
-    QVector<QPair<int, int>> marks;
+    QVector<QPair<int, size_t>> marks;
     int nextId = 1;
     QString innerCaption;
     bool applying = false;
+    // A clear() asked for by a command while it was applied waits until the entry is done.
+    bool clearRequested = false;
 
-    void apply(const QVector<Change>& changes, bool backwards)
+    void apply(const Commands& commands, bool backwards)
     {
         applying = true;
         if (backwards) {
-            for (int i = changes.size() - 1; i >= 0; --i) {
-                if (changes.at(i).property)
-                    changes.at(i).property->setValueVariant(changes.at(i).before);
-            }
+            for (auto it = commands.rbegin(); it != commands.rend(); ++it)
+                (*it)->undo();
         } else {
-            for (const Change& c : changes) {
-                if (c.property)
-                    c.property->setValueVariant(c.after);
-            }
+            for (const std::unique_ptr<RkUndoCommand>& c : commands)
+                c->redo();
         }
         applying = false;
+        if (clearRequested) {
+            clearRequested = false;
+            entries.clear();
+            index = 0;
+        }
     }
 };
 
@@ -96,7 +110,7 @@ bool RkUndoStack::canUndo() const
 
 bool RkUndoStack::canRedo() const
 {
-    return d->index < d->entries.size();
+    return d->index < count();
 }
 
 QString RkUndoStack::getUndoCaption() const
@@ -111,7 +125,7 @@ QString RkUndoStack::getRedoCaption() const
 
 int RkUndoStack::count() const
 {
-    return d->entries.size();
+    return int(d->entries.size());
 }
 
 int RkUndoStack::index() const
@@ -119,12 +133,18 @@ int RkUndoStack::index() const
     return d->index;
 }
 
-void RkUndoStack::recordPropertyChange(RkProperty* property, const QVariant& oldValue,
-                                       const QVariant& newValue)
+void RkUndoStack::push(std::unique_ptr<RkUndoCommand> command)
 {
-    if (d->applying || d->marks.isEmpty() || !property)
+    if (d->applying || !command)
         return;
-    d->pending.append(Change{property, oldValue, newValue});
+    if (!d->marks.isEmpty()) {
+        d->pending.push_back(std::move(command));
+        return;
+    }
+    const QString caption = command->caption();
+    Commands commands;
+    commands.push_back(std::move(command));
+    addEntry(caption, fold(std::move(commands)));
 }
 
 int RkUndoStack::openHold()
@@ -158,19 +178,9 @@ void RkUndoStack::acceptHold(int id, const QString& caption)
         return;
     }
     d->marks.clear();
-    const QVector<Change> changes = compress(d->pending);
+    Commands commands = fold(std::move(d->pending));
     d->pending.clear();
-    if (changes.isEmpty())
-        return;
-    const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
-    const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
-    d->entries.resize(d->index);
-    d->entries.append(Entry{caption.isEmpty() ? d->innerCaption : caption, changes});
-    d->index = d->entries.size();
-    notifyCaptions(oldUndo, oldRedo, oldCanUndo, oldCanRedo);
-    // The new entry is on top even when its caption equals the one before.
-    if (oldUndo == getUndoCaption())
-        Q_EMIT undoCaptionChanged(getUndoCaption());
+    addEntry(caption.isEmpty() ? d->innerCaption : caption, std::move(commands));
 }
 
 void RkUndoStack::cancelHold(int id)
@@ -178,39 +188,62 @@ void RkUndoStack::cancelHold(int id)
     const int level = holdLevel(id);
     if (level < 0)
         return;
-    const int mark = d->marks.at(level).second;
+    const size_t mark = d->marks.at(level).second;
     d->marks.resize(level);
-    // Each property goes back once, straight to where it was when the hold opened.
-    const QVector<Change> undone = compress(d->pending.mid(mark));
-    d->pending.resize(mark);
-    d->apply(undone, true);
+    // Each change is taken back once, straight to where it was when the hold opened.
+    Commands undone(std::make_move_iterator(d->pending.begin() + mark),
+                    std::make_move_iterator(d->pending.end()));
+    d->pending.erase(d->pending.begin() + mark, d->pending.end());
+    const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
+    const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
+    d->apply(fold(std::move(undone)), true);
+    notifyCaptions(oldUndo, oldRedo, oldCanUndo, oldCanRedo);
+}
+
+void RkUndoStack::addEntry(const QString& caption, Commands commands)
+{
+    if (commands.empty())
+        return;
+    const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
+    const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
+    d->entries.erase(d->entries.begin() + d->index, d->entries.end());
+    d->entries.push_back(Entry{caption, std::move(commands)});
+    d->index = count();
+    notifyCaptions(oldUndo, oldRedo, oldCanUndo, oldCanRedo);
+    // The new entry is on top even when its caption equals the one before.
+    if (oldUndo == getUndoCaption())
+        Q_EMIT undoCaptionChanged(getUndoCaption());
 }
 
 void RkUndoStack::undo()
 {
-    if (canPushItems() || !canUndo())
+    if (d->applying || canPushItems() || !canUndo())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
     const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
     d->index--;
-    d->apply(d->entries.at(d->index).changes, true);
+    d->apply(d->entries.at(d->index).commands, true);
     notifyCaptions(oldUndo, oldRedo, oldCanUndo, oldCanRedo);
 }
 
 void RkUndoStack::redo()
 {
-    if (canPushItems() || !canRedo())
+    if (d->applying || canPushItems() || !canRedo())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
     const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();
-    d->apply(d->entries.at(d->index).changes, false);
     d->index++;
+    d->apply(d->entries.at(d->index - 1).commands, false);
     notifyCaptions(oldUndo, oldRedo, oldCanUndo, oldCanRedo);
 }
 
 void RkUndoStack::clear()
 {
-    if (d->entries.isEmpty())
+    if (d->applying) {
+        d->clearRequested = true;
+        return;
+    }
+    if (d->entries.empty())
         return;
     const QString oldUndo = getUndoCaption(), oldRedo = getRedoCaption();
     const bool oldCanUndo = canUndo(), oldCanRedo = canRedo();

@@ -1,18 +1,17 @@
 #pragma once
 
 #include "rkcoreglobal.h"
+#include "undo/rkundocommand.h"
 
 #include <QObject>
-#include <QVariant>
 
 #include <memory>
-
-class RkProperty;
+#include <vector>
 
 // The application's undo stack. Owned by RkApp; rkUndoStack points at it.
-// Changes are recorded only while an RkUndoStackHold is open; the outermost hold turns them
-// into one entry when accepted, or takes them all back when cancelled. Changes made with no
-// hold open are not undoable.
+// An entry is a caption and a list of commands, undone last first and redone in order. While an
+// RkUndoStackHold is open, pushed commands join it; the outermost hold turns them into one entry
+// when accepted, or takes them all back when cancelled.
 class RKCORE_EXPORT RkUndoStack : public QObject
 {
     Q_OBJECT
@@ -31,9 +30,10 @@ public:
     int count() const;
     int index() const;
 
-    // Called by properties after a value change; ignored when no hold is open.
-    void recordPropertyChange(RkProperty* property, const QVariant& oldValue,
-                              const QVariant& newValue);
+    // Records a change the caller has already made. With a hold open the command joins it;
+    // otherwise it becomes an entry of its own under its caption. Ignored while the stack is
+    // undoing or redoing.
+    void push(std::unique_ptr<RkUndoCommand> command);
 
 public Q_SLOTS:
     // Both do nothing while a hold is open.
@@ -56,6 +56,7 @@ private:
     int holdLevel(int id) const;
     void acceptHold(int id, const QString& caption);
     void cancelHold(int id);
+    void addEntry(const QString& caption, std::vector<std::unique_ptr<RkUndoCommand>> commands);
     void notifyCaptions(const QString& oldUndo, const QString& oldRedo, bool oldCanUndo,
                         bool oldCanRedo);
 

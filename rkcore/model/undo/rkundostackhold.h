@@ -4,11 +4,11 @@
 
 #include <QString>
 
-// Gathers the property changes made while it lives into one undo entry. accept(caption) keeps
-// them as an entry with that caption; cancel() puts every changed value back and leaves nothing
-// on the stack. A hold destroyed undecided cancels. A hold opened while another is open folds
-// into the outer one: its accept keeps its changes for the outer entry, its cancel takes back
-// only the changes made since it was opened.
+// Gathers the changes pushed while it lives (property values among them) into one undo entry.
+// accept(caption) keeps them as an entry with that caption; cancel() takes every change back and
+// leaves nothing on the stack. A hold destroyed undecided cancels. A hold opened while another is
+// open folds into the outer one: its accept keeps its changes for the outer entry, its cancel
+// takes back only the changes made since it was opened.
 class RKCORE_EXPORT RkUndoStackHold
 {
 public:

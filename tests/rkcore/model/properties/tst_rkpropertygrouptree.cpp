@@ -44,7 +44,6 @@ class TestRkPropertyGroupTree : public QObject
 private Q_SLOTS:
     void groupsFollowPaths();
     void propertiesLeaveTheirGroups();
-    void intPropertyClampsOnAdjust();
 };
 
 void TestRkPropertyGroupTree::groupsFollowPaths()
@@ -97,23 +96,6 @@ void TestRkPropertyGroupTree::propertiesLeaveTheirGroups()
     e.removeProperty(ears);
     QCOMPARE(e.findProperty("ears"), nullptr);
     QCOMPARE(dump(e.getPropertyGroups()), QStringList({"Morphs: ", "Morphs/Body: BODY"}));
-}
-
-void TestRkPropertyGroupTree::intPropertyClampsOnAdjust()
-{
-    RkIntProperty p("level", "Level");
-    p.setMinMax(0, 3);
-    p.adjustValue(7);
-    QCOMPARE(p.getValue(), 7);
-    p.setClamped(true);
-    p.adjustValue(7);
-    QCOMPARE(p.getValue(), 3);
-    p.adjustValue(-2);
-    QCOMPARE(p.getValue(), 0);
-    p.beginEdit();
-    p.setValue(2);
-    p.cancelEdit();
-    QCOMPARE(p.getValue(), 0);
 }
 
 RK_TEST_MAIN(TestRkPropertyGroupTree)

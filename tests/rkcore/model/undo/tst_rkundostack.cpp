@@ -11,6 +11,70 @@
 
 #include <limits>
 
+namespace
+{
+
+// Sets an int as a property change sets a value, and logs every call so the order shows.
+class SetInt : public RkUndoCommand
+{
+public:
+    SetInt(int* target, int before, int after, QStringList* log, bool folds = true)
+        : RkUndoCommand(QStringLiteral("Set %1").arg(after)), m_target(target), m_before(before),
+          m_after(after), m_log(log), m_folds(folds)
+    {
+    }
+    void undo() override
+    {
+        *m_target = m_before;
+        m_log->append(QStringLiteral("undo %1").arg(m_after));
+    }
+    void redo() override
+    {
+        *m_target = m_after;
+        m_log->append(QStringLiteral("redo %1").arg(m_after));
+    }
+    const void* mergeKey() const override { return m_folds ? m_target : nullptr; }
+    void mergeWith(const RkUndoCommand& later) override
+    {
+        m_after = static_cast<const SetInt&>(later).m_after;
+    }
+    bool isNoChange() const override { return m_before == m_after; }
+
+private:
+    int* m_target;
+    int m_before, m_after;
+    QStringList* m_log;
+    bool m_folds;
+};
+
+// Same key as SetInt, another class: the two never fold together.
+class OtherSetInt : public SetInt
+{
+    using SetInt::SetInt;
+};
+
+// While the stack applies it: pushes a command, and clears the history if asked to.
+class Meddler : public RkUndoCommand
+{
+public:
+    Meddler(int* target, bool clears) : m_target(target), m_clears(clears) {}
+    void undo() override { meddle(); }
+    void redo() override { meddle(); }
+
+private:
+    void meddle()
+    {
+        rkUndoStack->push(std::make_unique<SetInt>(m_target, 0, 1, &m_log));
+        if (m_clears)
+            rkUndoStack->clear();
+    }
+    int* m_target;
+    bool m_clears;
+    QStringList m_log;
+};
+
+} // namespace
+
 class TestRkUndoStack : public QObject
 {
     Q_OBJECT
@@ -22,8 +86,11 @@ private Q_SLOTS:
     void nestedHoldsFoldIntoTheOutermost();
     void changesWithoutHoldAreNotUndoable();
     void cancelTakesBackCameraFraming();
-    void nonNumbersNeverEnterAProperty();
     void deletedPropertyIsSkipped();
+    void pushedCommandsJoinTheHold();
+    void pushWithoutHoldIsAnEntryOfItsOwn();
+    void commandsFoldThroughTheirKey();
+    void commandsCannotChangeTheStackWhileApplied();
 
 private:
     RkNode* node = nullptr;
@@ -235,32 +302,6 @@ void TestRkUndoStack::cancelTakesBackCameraFraming()
     QCOMPARE(rkUndoStack->count(), 0);
 }
 
-void TestRkUndoStack::nonNumbersNeverEnterAProperty()
-{
-    QSignalSpy logged(rkApp, &RkApp::logged);
-    QSignalSpy changed(a, &RkProperty::currentValueChanged);
-    a->setValue(0.5f);
-    changed.clear();
-    RkUndoStackHold hold;
-    QVERIFY(!a->setValue(std::numeric_limits<float>::quiet_NaN()));
-    QVERIFY(!a->adjustValue(std::numeric_limits<float>::infinity()));
-    QVERIFY(!a->setValueVariant(QVariant(-std::numeric_limits<float>::infinity())));
-    QCOMPARE(a->getValue(), 0.5f);
-    QCOMPARE(changed.count(), 0);
-    QCOMPARE(logged.count(), 1);
-    QVERIFY(logged.at(0).at(0).toString().contains(QStringLiteral("\"a\"")));
-    hold.accept(QStringLiteral("Nothing"));
-    QCOMPARE(rkUndoStack->count(), 0);
-
-    // Clamping applies to adjustValue only.
-    a->setMinMax(0, 1);
-    a->setClamped(true);
-    a->adjustValue(1.5f);
-    QCOMPARE(a->getValue(), 1.0f);
-    a->setValue(1.5f);
-    QCOMPARE(a->getValue(), 1.5f);
-}
-
 void TestRkUndoStack::deletedPropertyIsSkipped()
 {
     {
@@ -278,6 +319,131 @@ void TestRkUndoStack::deletedPropertyIsSkipped()
     // Clearing the scene forgets the history.
     rkScene->clear();
     QVERIFY(!rkUndoStack->canUndo());
+}
+
+void TestRkUndoStack::pushedCommandsJoinTheHold()
+{
+    QStringList log;
+    int x = 0, y = 0;
+    {
+        RkUndoStackHold hold;
+        x = 1;
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 0, 1, &log));
+        a->setValue(2);
+        y = 3;
+        rkUndoStack->push(std::make_unique<SetInt>(&y, 0, 3, &log));
+        hold.accept(QStringLiteral("Mixed"));
+    }
+    QVERIFY(log.isEmpty()); // pushing records a change already made
+    QCOMPARE(rkUndoStack->count(), 1);
+    rkUndoStack->undo();
+    QCOMPARE(log, QStringList({"undo 3", "undo 1"}));
+    QCOMPARE(a->getValue(), 0.0f);
+    QCOMPARE(x, 0);
+    log.clear();
+    rkUndoStack->redo();
+    QCOMPARE(log, QStringList({"redo 1", "redo 3"}));
+    QCOMPARE(a->getValue(), 2.0f);
+    QCOMPARE(y, 3);
+
+    // An inner hold's cancel takes back its own commands, the outer one's the rest.
+    log.clear();
+    {
+        RkUndoStackHold outer;
+        x = 4;
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 1, 4, &log));
+        {
+            RkUndoStackHold inner;
+            y = 5;
+            rkUndoStack->push(std::make_unique<SetInt>(&y, 3, 5, &log));
+            a->setValue(6);
+        }
+        QCOMPARE(log, QStringList({"undo 5"}));
+        QCOMPARE(a->getValue(), 2.0f);
+        outer.cancel();
+    }
+    QCOMPARE(log, QStringList({"undo 5", "undo 4"}));
+    QCOMPARE(x, 1);
+    QCOMPARE(rkUndoStack->count(), 1);
+}
+
+void TestRkUndoStack::pushWithoutHoldIsAnEntryOfItsOwn()
+{
+    QSignalSpy captions(rkUndoStack, &RkUndoStack::undoCaptionChanged);
+    QStringList log;
+    int x = 2;
+    rkUndoStack->push(std::make_unique<SetInt>(&x, 0, 2, &log));
+    QVERIFY(log.isEmpty());
+    QCOMPARE(rkUndoStack->count(), 1);
+    QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Set 2"));
+    QCOMPARE(captions.count(), 1);
+    // A command that changes nothing leaves no entry.
+    rkUndoStack->push(std::make_unique<SetInt>(&x, 2, 2, &log));
+    QCOMPARE(rkUndoStack->count(), 1);
+    rkUndoStack->undo();
+    QCOMPARE(x, 0);
+    QCOMPARE(rkUndoStack->getRedoCaption(), QStringLiteral("Set 2"));
+}
+
+void TestRkUndoStack::commandsFoldThroughTheirKey()
+{
+    QStringList log;
+    int x = 0, y = 0;
+    {
+        RkUndoStackHold hold;
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 0, 1, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&y, 0, 5, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 1, 2, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 2, 3, &log));
+        hold.accept(QStringLiteral("Drag"));
+    }
+    rkUndoStack->undo();
+    QCOMPARE(log, QStringList({"undo 5", "undo 3"}));
+    QCOMPARE(x, 0);
+
+    // Folding stops at another class with the same key and at a command that never folds.
+    log.clear();
+    {
+        RkUndoStackHold hold;
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 0, 1, &log));
+        rkUndoStack->push(std::make_unique<OtherSetInt>(&x, 1, 2, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 2, 3, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&y, 0, 9, &log, false));
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 3, 4, &log));
+        rkUndoStack->push(std::make_unique<SetInt>(&x, 4, 5, &log));
+        hold.accept(QStringLiteral("Steps"));
+    }
+    rkUndoStack->undo();
+    QCOMPARE(log, QStringList({"undo 5", "undo 9", "undo 3", "undo 2", "undo 1"}));
+}
+
+void TestRkUndoStack::commandsCannotChangeTheStackWhileApplied()
+{
+    int x = 0;
+    rkUndoStack->push(std::make_unique<Meddler>(&x, false));
+    rkUndoStack->undo();
+    QCOMPARE(rkUndoStack->count(), 1);
+    rkUndoStack->redo();
+    QCOMPARE(rkUndoStack->count(), 1);
+    QVERIFY(!rkUndoStack->canRedo());
+    {
+        RkUndoStackHold outer;
+        {
+            RkUndoStackHold inner;
+            rkUndoStack->push(std::make_unique<Meddler>(&x, false));
+        }
+        outer.accept(QStringLiteral("Cancelled"));
+    }
+    QCOMPARE(rkUndoStack->count(), 1);
+
+    // A clear asked for while undoing happens once the entry is undone.
+    QSignalSpy canUndo(rkUndoStack, &RkUndoStack::canUndoChanged);
+    rkUndoStack->push(std::make_unique<Meddler>(&x, true));
+    rkUndoStack->undo();
+    QCOMPARE(rkUndoStack->count(), 0);
+    QVERIFY(!rkUndoStack->canRedo());
+    QCOMPARE(canUndo.count(), 1);
+    QVERIFY(!canUndo.last().at(0).toBool());
 }
 
 RK_TEST_MAIN(TestRkUndoStack)
