@@ -12,6 +12,7 @@
 #include "scene/rkscene.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
+#include "rkscriptsurface.h"
 #include "app/rkstyle.h"
 #include "viewport/rkviewportmgr.h"
 
@@ -155,6 +156,7 @@ int main(int argc, char** argv)
     // Scripts reach the window's widgets by object name: mainWindow.findChild("RkToolPaneDock").
     QScriptEngine* engine = core.getScriptEngine();
     engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
+    rkInstallScriptSurface(engine);
     window.getActionMgr()->buildMenus();
     // Help stays the last menu.
     window.addMenu(QStringLiteral("&Help"));
