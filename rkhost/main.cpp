@@ -12,6 +12,7 @@
 #include "scene/rkscene.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
+#include "rkscriptsurface.h"
 #include "app/rkstyle.h"
 #include "viewport/rkviewportmgr.h"
 
@@ -82,6 +83,23 @@ int runScript(const QString& fileName)
     return 0;
 }
 
+// A scene named on the command line replaces the demo scene; one that cannot be opened leaves the
+// demo scene. The user is told why in a message box, or on stderr when the host runs unattended,
+// which then stops.
+bool openStartScene(const QString& path, RkSceneMenus* menus, bool unattended)
+{
+    if (!unattended) {
+        menus->openScene(path);
+        return true;
+    }
+    QString error;
+    if (rkScene->load(path, &error))
+        return true;
+    std::fprintf(stderr, "rkhost: cannot open scene %s: %s\n", qPrintable(path),
+                 qPrintable(error.simplified()));
+    return false;
+}
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -121,6 +139,9 @@ int main(int argc, char** argv)
          QStringLiteral("Start, let the window settle, save it as PNG <file> and exit."),
          QStringLiteral("file")},
     });
+    parser.addPositionalArgument(QStringLiteral("scene"),
+                                 QStringLiteral("Open the scene file <scene> at start."),
+                                 QStringLiteral("[scene]"));
     parser.process(app);
 
     RkApp core;
@@ -144,7 +165,7 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&Edit"));
     window.addMenu(QStringLiteral("&View"));
     window.addMenu(QStringLiteral("&Window"));
-    new RkSceneMenus(&window);
+    auto* sceneMenus = new RkSceneMenus(&window);
     rkAddSceneList(&window);
     rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
@@ -155,11 +176,17 @@ int main(int argc, char** argv)
     // Scripts reach the window's widgets by object name: mainWindow.findChild("RkToolPaneDock").
     QScriptEngine* engine = core.getScriptEngine();
     engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
+    rkInstallScriptSurface(engine);
     window.getActionMgr()->buildMenus();
     // Help stays the last menu.
     window.addMenu(QStringLiteral("&Help"));
     window.resize(1280, 800);
     window.show();
+    if (!parser.positionalArguments().isEmpty() &&
+        !openStartScene(parser.positionalArguments().constFirst(), sceneMenus,
+                        parser.isSet(QStringLiteral("script")) ||
+                            parser.isSet(QStringLiteral("screenshot"))))
+        return 1;
     sceneView->frameCamera();
 
     const QString script = parser.value(QStringLiteral("script"));

@@ -1,4 +1,5 @@
 #include "rktestmain.h"
+#include "scene/rkscene.h"
 
 #include <QImage>
 #include <QProcess>
@@ -46,6 +47,7 @@ private Q_SLOTS:
     void screenshotShowsTheDockedToolTab();
     void scriptConstructsModuleClasses();
     void scriptErrorExitsNonZero();
+    void sceneFileOnTheCommandLine();
     void listPlugins();
     void refusedModulesLeaveTheHostRunning();
     void noDisplaySaysWhatToDo();
@@ -96,6 +98,32 @@ void TestRkHost::scriptErrorExitsNonZero()
     QCOMPARE(run.exitCode, 1);
     QCOMPARE(run.out, QStringLiteral("before\n"));
     QVERIFY2(run.err.contains(QStringLiteral("broken.js:2: ReferenceError")), qPrintable(run.err));
+}
+
+void TestRkHost::sceneFileOnTheCommandLine()
+{
+    rkScene->clear();
+    auto* node = new RkNode;
+    node->setName(QStringLiteral("Lonely"));
+    rkScene->addNode(node);
+    const QString good = m_dir.filePath(QStringLiteral("good.rks"));
+    QVERIFY(rkScene->save(good));
+    const QString script = writeScript(m_dir, QStringLiteral("count.js"),
+                                       QStringLiteral("print(scene.getNumNodes(), "
+                                                      "scene.getNode(0).name);\n"));
+    const Run run = runHost({good, QStringLiteral("--script"), script});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QCOMPARE(run.out, QStringLiteral("1 Lonely\n"));
+
+    // Unattended, a file that cannot be opened stops the host with one line and runs nothing.
+    const QString bad = writeScript(m_dir, QStringLiteral("bad.rks"), QStringLiteral("no scene"));
+    const Run failed = runHost({bad, QStringLiteral("--script"), script});
+    QCOMPARE(failed.exitCode, 1);
+    QCOMPARE(failed.out, QString());
+    QCOMPARE(failed.err.count(QLatin1Char('\n')), 1);
+    QVERIFY2(failed.err.startsWith(QStringLiteral("rkhost: cannot open scene ")) &&
+                 failed.err.contains(QStringLiteral("bad.rks: ")),
+             qPrintable(failed.err));
 }
 
 void TestRkHost::listPlugins()
