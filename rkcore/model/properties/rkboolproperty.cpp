@@ -17,6 +17,11 @@ bool RkBoolProperty::getValue() const
 
 bool RkBoolProperty::setValue(bool value)
 {
+    return !isLocked() && storeValue(value);
+}
+
+bool RkBoolProperty::storeValue(bool value)
+{
     if (value == m_value)
         return true;
     const bool old = m_value;
@@ -49,7 +54,7 @@ bool RkBoolProperty::setValueVariant(const QVariant& value)
 {
     if (value.type() != QVariant::Bool)
         return false;
-    return setValue(value.toBool());
+    return storeValue(value.toBool());
 }
 
 void RkBoolProperty::saveState(RkOutFile* file) const
@@ -64,5 +69,5 @@ void RkBoolProperty::loadState(RkInFile* file)
     if (!file->readBool(value) || !file->readBool(def))
         return;
     setDefaultValue(def);
-    setValue(value);
+    storeValue(value);
 }

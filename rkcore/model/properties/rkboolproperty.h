@@ -22,6 +22,8 @@ public:
     void loadState(RkInFile* file) override;
 
 private:
+    bool storeValue(bool value);
+
     bool m_value = false;
     bool m_default = false;
 };

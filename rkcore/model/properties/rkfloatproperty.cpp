@@ -19,6 +19,11 @@ float RkFloatProperty::getValue() const
 
 bool RkFloatProperty::setValue(float value)
 {
+    return !isLocked() && storeValue(value);
+}
+
+bool RkFloatProperty::storeValue(float value)
+{
     if (!std::isfinite(value)) {
         logRefusedValue(QString::number(double(value)));
         return false;
@@ -36,6 +41,19 @@ bool RkFloatProperty::adjustValue(float value)
     if (std::isfinite(value) && isClamped())
         value = qBound(m_min, value, m_max);
     return setValue(value);
+}
+
+float RkFloatProperty::getMemorizedValue() const
+{
+    return m_hasMemorized ? m_memorized : m_default;
+}
+
+void RkFloatProperty::setMemorizedValue(float value)
+{
+    if (!std::isfinite(value))
+        return;
+    m_memorized = value;
+    m_hasMemorized = true;
 }
 
 float RkFloatProperty::getDefaultValue() const
@@ -108,7 +126,7 @@ bool RkFloatProperty::setValueVariant(const QVariant& value)
 {
     bool ok = false;
     const float v = value.toFloat(&ok);
-    return ok && setValue(v);
+    return ok && storeValue(v);
 }
 
 void RkFloatProperty::saveState(RkOutFile* file) const
@@ -120,6 +138,7 @@ void RkFloatProperty::saveState(RkOutFile* file) const
     file->writeFloat(m_sensitivity);
     file->writeBool(isClamped());
     file->writeBool(m_percent);
+    file->writeFloat(getMemorizedValue());
 }
 
 void RkFloatProperty::loadState(RkInFile* file)
@@ -140,5 +159,9 @@ void RkFloatProperty::loadState(RkInFile* file)
     setSensitivity(sensitivity);
     setClamped(clamped);
     setDisplayAsPercent(percent);
-    setValue(value);
+    storeValue(value);
+    // Files from before memorized values end here.
+    float memorized = 0;
+    if (!file->atSectionEnd() && file->readFloat(memorized))
+        setMemorizedValue(memorized);
 }

@@ -17,6 +17,9 @@ public:
     bool setValue(float value);
     bool adjustValue(float value);
 
+    // The value that "Restore" goes back to: the default until something is memorized.
+    float getMemorizedValue() const;
+    void setMemorizedValue(float value);
     float getDefaultValue() const;
     void setDefaultValue(float value);
     float getMin() const;
@@ -37,7 +40,11 @@ Q_SIGNALS:
     void displayAsPercentChanged();
 
 private:
+    bool storeValue(float value);
+
     float m_value = 0.0f;
+    float m_memorized = 0.0f;
+    bool m_hasMemorized = false;
     float m_default = 0.0f;
     float m_min = -10000.0f;
     float m_max = 10000.0f;

@@ -8,6 +8,14 @@ RkIntProperty::RkIntProperty(const QString& name, const QString& label, QObject*
 {
 }
 
+RkIntProperty::RkIntProperty(const QString& name, bool clamped, bool hidden, int value,
+                             QObject* parent)
+    : RkNumericProperty(name, name, parent), m_value(value)
+{
+    setClamped(clamped);
+    setHidden(hidden);
+}
+
 RkIntProperty::~RkIntProperty() = default;
 
 int RkIntProperty::getValue() const
@@ -16,6 +24,11 @@ int RkIntProperty::getValue() const
 }
 
 bool RkIntProperty::setValue(int value)
+{
+    return !isLocked() && storeValue(value);
+}
+
+bool RkIntProperty::storeValue(int value)
 {
     if (value == m_value)
         return true;
@@ -28,6 +41,17 @@ bool RkIntProperty::setValue(int value)
 bool RkIntProperty::adjustValue(int value)
 {
     return setValue(isClamped() ? qBound(m_min, value, m_max) : value);
+}
+
+int RkIntProperty::getMemorizedValue() const
+{
+    return m_hasMemorized ? m_memorized : m_default;
+}
+
+void RkIntProperty::setMemorizedValue(int value)
+{
+    m_memorized = value;
+    m_hasMemorized = true;
 }
 
 int RkIntProperty::getDefaultValue() const
@@ -73,7 +97,7 @@ bool RkIntProperty::setValueVariant(const QVariant& value)
 {
     bool ok = false;
     const int v = value.toInt(&ok);
-    return ok && setValue(v);
+    return ok && storeValue(v);
 }
 
 void RkIntProperty::saveState(RkOutFile* file) const
@@ -83,6 +107,7 @@ void RkIntProperty::saveState(RkOutFile* file) const
     file->writeInt(m_min);
     file->writeInt(m_max);
     file->writeBool(isClamped());
+    file->writeInt(getMemorizedValue());
 }
 
 void RkIntProperty::loadState(RkInFile* file)
@@ -100,5 +125,9 @@ void RkIntProperty::loadState(RkInFile* file)
     setMinMax(min, max);
     setDefaultValue(def);
     setClamped(clamped);
-    setValue(value);
+    storeValue(value);
+    // Files from before memorized values end here.
+    int memorized = 0;
+    if (!file->atSectionEnd() && file->readInt(memorized))
+        setMemorizedValue(memorized);
 }

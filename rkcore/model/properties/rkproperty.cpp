@@ -12,6 +12,7 @@ struct RkProperty::Private {
     bool favorite = false;
     bool globalFavorite = false;
     bool selected = false;
+    bool locked = false;
     bool editing = false;
     // The value beginEdit() found, put back by cancelEdit().
     QVariant editStart;
@@ -101,6 +102,19 @@ void RkProperty::setSelected(bool on)
     Q_EMIT selectedChanged(on);
 }
 
+bool RkProperty::isLocked() const
+{
+    return d->locked;
+}
+
+void RkProperty::setLocked(bool on)
+{
+    if (on == d->locked)
+        return;
+    d->locked = on;
+    Q_EMIT flagsChanged();
+}
+
 QString RkProperty::widgetClassName() const
 {
     return QStringLiteral("RkLabelPropertyWgt");
@@ -142,7 +156,7 @@ bool RkProperty::setValueVariant(const QVariant&)
 int RkProperty::getFlags() const
 {
     return (d->hidden ? Hidden : 0) | (d->favorite ? Favorite : 0) |
-           (d->globalFavorite ? GlobalFavorite : 0);
+           (d->globalFavorite ? GlobalFavorite : 0) | (d->locked ? Locked : 0);
 }
 
 void RkProperty::setFlags(int flags)
@@ -150,6 +164,7 @@ void RkProperty::setFlags(int flags)
     setHidden(flags & Hidden);
     setIsFavorite(flags & Favorite);
     setIsGlobalFavorite(flags & GlobalFavorite);
+    setLocked(flags & Locked);
 }
 
 void RkProperty::saveState(RkOutFile*) const {}

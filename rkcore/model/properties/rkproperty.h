@@ -31,6 +31,11 @@ public:
     void setIsGlobalFavorite(bool on);
     bool isSelected() const;
     void setSelected(bool on);
+    // A locked property refuses changes through its value setters, which is what the user's
+    // widgets and scripts use; loading, undo and redo (setValueVariant) still set it. Stored with
+    // the scene as a flag.
+    bool isLocked() const;
+    void setLocked(bool on);
 
     // Class name of the widget that edits the property.
     virtual QString widgetClassName() const;
@@ -47,7 +52,7 @@ public:
     virtual bool setValueVariant(const QVariant& value);
 
     // Flags as stored in a scene file.
-    enum Flag { Hidden = 1, Favorite = 2, GlobalFavorite = 4 };
+    enum Flag { Hidden = 1, Favorite = 2, GlobalFavorite = 4, Locked = 8 };
     int getFlags() const;
     void setFlags(int flags);
 

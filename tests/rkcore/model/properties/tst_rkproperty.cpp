@@ -17,6 +17,8 @@ private Q_SLOTS:
     void clampingAppliesToAdjustValueOnly();
     void cancelEditPutsBackTheStartValue();
     void flagsSetEachFlag();
+    void lockRefusesTheSettersOnly();
+    void memorizedValueFollowsTheDefaultUntilSet();
 };
 
 void TestRkProperty::nonNumbersNeverEnterAProperty()
@@ -97,6 +99,50 @@ void TestRkProperty::flagsSetEachFlag()
     // Setting the same flags again announces nothing.
     p.setFlags(p.getFlags());
     QCOMPARE(changed.count(), 4);
+}
+
+void TestRkProperty::lockRefusesTheSettersOnly()
+{
+    RkFloatProperty f(QStringLiteral("f"), QStringLiteral("Tilt"));
+    RkIntProperty n(QStringLiteral("n"), QStringLiteral("Count"));
+    {
+        RkUndoStackHold hold;
+        f.setValue(0.5f);
+        hold.accept(QStringLiteral("Tilt"));
+    }
+    f.setLocked(true);
+    n.setLocked(true);
+    QVERIFY(f.getFlags() & RkProperty::Locked);
+    QVERIFY(!f.setValue(0.9f));
+    QVERIFY(!f.adjustValue(0.9f));
+    QVERIFY(!n.setValue(3));
+    QCOMPARE(f.getValue(), 0.5f);
+    QCOMPARE(n.getValue(), 0);
+    // History and files still reach a locked property.
+    rkUndoStack->undo();
+    QCOMPARE(f.getValue(), 0.0f);
+    QVERIFY(f.setValueVariant(QVariant(0.25f)));
+    QCOMPARE(f.getValue(), 0.25f);
+    f.setFlags(0);
+    QVERIFY(!f.isLocked());
+    QVERIFY(f.setValue(0.75f));
+}
+
+void TestRkProperty::memorizedValueFollowsTheDefaultUntilSet()
+{
+    RkFloatProperty f(QStringLiteral("f"), QStringLiteral("F"));
+    f.setDefaultValue(0.2f);
+    QCOMPARE(f.getMemorizedValue(), 0.2f);
+    f.setMemorizedValue(0.6f);
+    f.setDefaultValue(0.3f);
+    QCOMPARE(f.getMemorizedValue(), 0.6f);
+    f.setMemorizedValue(std::numeric_limits<float>::quiet_NaN());
+    QCOMPARE(f.getMemorizedValue(), 0.6f);
+
+    RkIntProperty label(QStringLiteral("note"), false, true, 4);
+    QCOMPARE(label.getLabel(), QStringLiteral("note"));
+    QVERIFY(label.isHidden() && !label.isClamped());
+    QCOMPARE(label.getValue(), 4);
 }
 
 RK_TEST_MAIN(TestRkProperty)

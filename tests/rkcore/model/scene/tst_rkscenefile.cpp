@@ -141,10 +141,15 @@ QString sceneText()
                    .arg(n->getOrigin().y())
                    .arg(n->getOrigin().z());
         for (RkProperty* p : n->getProperties()) {
-            out << QStringLiteral("  %1 %2 \"%3\" %4 flags=%5 value=%6")
+            QString memorized = QStringLiteral("-");
+            if (auto* f = qobject_cast<RkFloatProperty*>(p))
+                memorized = QString::number(double(f->getMemorizedValue()));
+            else if (auto* i = qobject_cast<RkIntProperty*>(p))
+                memorized = QString::number(i->getMemorizedValue());
+            out << QStringLiteral("  %1 %2 \"%3\" %4 flags=%5 value=%6 memorized=%7")
                        .arg(p->className(), p->getName(), p->getLabel(), p->getPath())
                        .arg(p->getFlags())
-                       .arg(p->getValueVariant().toString());
+                       .arg(p->getValueVariant().toString(), memorized);
         }
         for (RkElementData* item : n->getDataItems()) {
             auto* data = qobject_cast<TestData*>(item);
@@ -311,8 +316,14 @@ void TestRkSceneFile::buildScene()
     ears->setIsGlobalFavorite(true);
     ears->setHidden(true);
     ears->setLabel("Big Ears");
+    // Locked after its change: loading must still restore the value.
+    ears->setValue(0.4f);
+    ears->setLocked(true);
+    smile->setMemorizedValue(0.25f);
     figure->findBone("lShldr")->getZRotate()->setValue(-35.5f);
-    qobject_cast<RkIntProperty*>(figure->findProperty("SubdivisionLevel"))->setValue(2);
+    auto* level = qobject_cast<RkIntProperty*>(figure->findProperty("SubdivisionLevel"));
+    level->setValue(2);
+    level->setMemorizedValue(1);
     qobject_cast<RkBoolProperty*>(figure->findProperty("CastShadows"))->setValue(false);
 
     // A property only the file knows about.
