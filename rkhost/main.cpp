@@ -90,10 +90,11 @@ int main(int argc, char** argv)
         if (wantsListOnly(argc, argv)) {
             qputenv("QT_QPA_PLATFORM", "offscreen");
         } else {
-            std::fprintf(stderr,
-                         "rkhost: no display. Run it under a virtual X server, for example:\n"
-                         "  xvfb-run -a -s '-screen 0 1600x1200x24' %s --screenshot host.png\n",
-                         argv[0]);
+            std::fprintf(
+                stderr,
+                "rkhost: no display. Run it under a virtual X server, for example:\n"
+                "  xvfb-run -a -s '-screen 0 1600x1200x24 -noreset' %s --screenshot host.png\n",
+                argv[0]);
             return 2;
         }
     }
