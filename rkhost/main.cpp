@@ -198,8 +198,8 @@ int main(int argc, char** argv)
         }
     }
 
-    rkKeepGLDriverLoaded();
     QApplication app(argc, argv);
+    rkKeepGLDriverLoaded();
     QApplication::setApplicationName(QStringLiteral("rkhost"));
     QApplication::setOrganizationName(QStringLiteral("rkhost"));
     QApplication::setApplicationVersion(QStringLiteral("3.0.1"));
