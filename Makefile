@@ -4,7 +4,9 @@
 BUILD      ?= build
 BUILD_TYPE ?= RelWithDebInfo
 JOBS       ?= $(shell nproc)
-XVFB        = xvfb-run -a -s "-screen 0 1600x1200x24"
+# One X server for the whole run; -noreset keeps it from resetting whenever its last client leaves,
+# which a client connecting at that moment would see as a refused connection.
+XVFB        = xvfb-run -a -s "-screen 0 1600x1200x24 -noreset"
 GENERATOR   = $(shell command -v ninja >/dev/null 2>&1 && echo "-G Ninja")
 export CCACHE_BASEDIR ?= $(CURDIR)
 
@@ -22,7 +24,7 @@ build: configure
 run: build
 	@if [ -z "$$DISPLAY" ] && [ -z "$$WAYLAND_DISPLAY" ]; then \
 	  echo "make run: no display. Start the host under a virtual X server, for example:"; \
-	  echo "  xvfb-run -a -s '-screen 0 1600x1200x24' $(BUILD)/bin/rkhost --screenshot host.png"; \
+	  echo "  xvfb-run -a -s '-screen 0 1600x1200x24 -noreset' $(BUILD)/bin/rkhost --screenshot host.png"; \
 	  exit 1; \
 	fi
 	$(BUILD)/bin/rkhost

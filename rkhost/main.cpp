@@ -21,9 +21,11 @@
 #include <QDir>
 #include <QFile>
 #include <QMenu>
+#include <QPainter>
 #include <QScreen>
 #include <QScriptEngine>
 #include <QTimer>
+#include <QWindow>
 
 #include <cstdio>
 
@@ -100,6 +102,103 @@ bool openStartScene(const QString& path, RkSceneMenus* menus, bool unattended)
     return false;
 }
 
+// The scene viewport of the main window; it can also draw its picture for a screenshot.
+class SceneView : public Rk3DViewport
+{
+public:
+    // Draws the picture into the back buffer without handing it to the display and reads it
+    // back: a widget grab leaves the OpenGL surface out, and the display may show another
+    // window there.
+    QImage drawForGrab()
+    {
+        setAutoBufferSwap(false);
+        updateGL();
+        QImage picture = grabFrameBuffer();
+        setAutoBufferSwap(true);
+        return picture;
+    }
+};
+
+// Saves the main window as PNG once the scene viewport shows the scene: after the window is
+// exposed and the events posted until then (layouts, refreshes) have run, the viewport has to
+// present a frame within the time limit. The picture is put together from the widgets' own
+// painting and the viewport's frame rather than read from the display, where another program's
+// window may lie over this one.
+class Screenshot : public QObject
+{
+public:
+    static constexpr int kFrameTimeoutMs = 10000;
+
+    Screenshot(QWidget* window, SceneView* view, const QString& fileName)
+        : QObject(window), m_window(window), m_view(view), m_fileName(fileName)
+    {
+        m_deadline.setSingleShot(true);
+        m_deadline.setTimerType(Qt::PreciseTimer);
+        connect(&m_deadline, &QTimer::timeout, this, [this] {
+            std::fprintf(stderr,
+                         "rkhost: the 3D viewport presented no frame within %d s; %s not written\n",
+                         kFrameTimeoutMs / 1000, qPrintable(m_fileName));
+            QCoreApplication::exit(1);
+        });
+    }
+
+    void start()
+    {
+        m_deadline.start(kFrameTimeoutMs);
+        QWindow* handle = m_window->windowHandle();
+        if (handle->isExposed())
+            QTimer::singleShot(0, this, &Screenshot::requestFrame);
+        else
+            handle->installEventFilter(this);
+    }
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override
+    {
+        if (event->type() == QEvent::Expose && static_cast<QWindow*>(watched)->isExposed()) {
+            watched->removeEventFilter(this);
+            QTimer::singleShot(0, this, &Screenshot::requestFrame);
+        }
+        return false;
+    }
+
+private:
+    void requestFrame()
+    {
+        QCoreApplication::sendPostedEvents();
+        // Queued: the picture is taken outside the paint that presented the frame.
+        connect(m_view, &Rk3DViewport::framePresented, this, &Screenshot::save,
+                Qt::QueuedConnection);
+        m_view->update();
+    }
+
+    void save()
+    {
+        if (m_done)
+            return;
+        m_done = true;
+        m_deadline.stop();
+        const QImage picture = m_view->drawForGrab();
+        if (picture.isNull()) {
+            std::fprintf(stderr, "rkhost: cannot read the 3D viewport's picture back\n");
+            QCoreApplication::exit(1);
+            return;
+        }
+        QImage shot = m_window->grab().toImage();
+        QPainter(&shot).drawImage(m_view->mapTo(m_window, QPoint()), picture);
+        const bool saved = shot.save(m_fileName, "PNG");
+        if (!saved)
+            std::fprintf(stderr, "rkhost: cannot write %s\n", qPrintable(m_fileName));
+        QCoreApplication::exit(saved ? 0 : 1);
+    }
+
+    QWidget* m_window;
+    SceneView* m_view;
+    QString m_fileName;
+    QTimer m_deadline;
+    bool m_done = false;
+};
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -108,16 +207,17 @@ int main(int argc, char** argv)
         if (wantsListOnly(argc, argv)) {
             qputenv("QT_QPA_PLATFORM", "offscreen");
         } else {
-            std::fprintf(stderr,
-                         "rkhost: no display. Run it under a virtual X server, for example:\n"
-                         "  xvfb-run -a -s '-screen 0 1600x1200x24' %s --screenshot host.png\n",
-                         argv[0]);
+            std::fprintf(
+                stderr,
+                "rkhost: no display. Run it under a virtual X server, for example:\n"
+                "  xvfb-run -a -s '-screen 0 1600x1200x24 -noreset' %s --screenshot host.png\n",
+                argv[0]);
             return 2;
         }
     }
 
-    rkKeepGLDriverLoaded();
     QApplication app(argc, argv);
+    rkKeepGLDriverLoaded();
     QApplication::setApplicationName(QStringLiteral("rkhost"));
     QApplication::setOrganizationName(QStringLiteral("rkhost"));
     QApplication::setApplicationVersion(QStringLiteral("3.0.1"));
@@ -158,7 +258,7 @@ int main(int argc, char** argv)
     RkMainWindow window;
     window.setWindowTitle(QStringLiteral("rkhost"));
     // The scene is shown in the 3D viewport, framed on the whole scene at start.
-    auto* sceneView = new Rk3DViewport;
+    auto* sceneView = new SceneView;
     sceneView->setObjectName(QStringLiteral("SceneView"));
     window.setSceneWidget(sceneView);
     window.addMenu(QStringLiteral("&File"));
@@ -201,21 +301,8 @@ int main(int argc, char** argv)
             }
         }
         if (!screenshot.isEmpty()) {
-            // Give layouts, docks and posted refreshes time to settle before grabbing.
-            QTimer::singleShot(500, &app, [&] {
-                // Read back what the display shows: the 3D viewport draws with OpenGL into its
-                // own surface, which a widget grab would leave black. Its picture is drawn and
-                // handed to the display first, so a busy machine cannot leave it out.
-                sceneView->updateGL();
-                QApplication::sync();
-                QImage shot = window.screen()->grabWindow(window.winId()).toImage();
-                if (shot.isNull())
-                    shot = window.grab().toImage();
-                const bool saved = shot.save(screenshot, "PNG");
-                if (!saved)
-                    std::fprintf(stderr, "rkhost: cannot write %s\n", qPrintable(screenshot));
-                QCoreApplication::exit(saved ? 0 : 1);
-            });
+            auto* taker = new Screenshot(&window, sceneView, screenshot);
+            taker->start();
         }
     });
     return app.exec();

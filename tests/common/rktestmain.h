@@ -18,8 +18,8 @@
     int main(int argc, char** argv)                                                                \
     {                                                                                              \
         QStandardPaths::setTestModeEnabled(true);                                                  \
-        rkKeepGLDriverLoaded();                                                                    \
         QApplication app(argc, argv);                                                              \
+        rkKeepGLDriverLoaded();                                                                    \
         RkStyle::install();                                                                        \
         RkApp core;                                                                                \
         core.setRunning(true);                                                                     \

@@ -60,6 +60,9 @@ struct Rk3DViewport::Private {
     // Aspect of the picture being framed: the widget's, or the offscreen render's during one.
     float renderAspect = 0.0f;
 
+    // Set by paintGL(): tells glDraw() that the base class really drew.
+    bool painted = false;
+
     Qt::MouseButton dragButton = Qt::NoButton;
     QPoint pressPos;
     QPoint lastPos;
@@ -290,6 +293,15 @@ bool Rk3DViewport::hardwareRender(RkRenderHandler* handler)
     return true;
 }
 
+void Rk3DViewport::glDraw()
+{
+    // The base class draws and swaps, or returns early while the context is unusable.
+    d->painted = false;
+    QGLWidget::glDraw();
+    if (d->painted && (!doubleBuffer() || autoBufferSwap()))
+        Q_EMIT framePresented();
+}
+
 void Rk3DViewport::initializeGL()
 {
     glEnable(GL_DEPTH_TEST);
@@ -306,6 +318,7 @@ void Rk3DViewport::paintGL()
     d->gather(items, true);
     d->renderer.draw(items, getCamera(), width(), height(), d->background,
                      RkSceneRenderer::DrawGround | RkSceneRenderer::DrawHighlight);
+    d->painted = true;
 }
 
 void Rk3DViewport::mousePressEvent(QMouseEvent* event)

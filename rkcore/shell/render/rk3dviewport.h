@@ -49,7 +49,14 @@ public:
     // empty or larger than the buffer allows, or offscreen rendering is not available.
     virtual bool hardwareRender(RkRenderHandler* handler);
 
+Q_SIGNALS:
+    // A frame drawn by paintGL() was handed to the display: emitted after the buffer swap (or
+    // the flush of a single-buffered context). Not emitted for offscreen renders, nor for a draw
+    // with autoBufferSwap() off, nor when the context could not draw.
+    void framePresented();
+
 protected:
+    void glDraw() override;
     void initializeGL() override;
     void resizeGL(int w, int h) override;
     void paintGL() override;
