@@ -1,0 +1,8 @@
+#include "widgets/rkwidgetlistlayout.h"
+
+RkWidgetListLayout::RkWidgetListLayout(QWidget* parent)
+    : QBoxLayout(QBoxLayout::TopToBottom, parent)
+{
+}
+
+RkWidgetListLayout::~RkWidgetListLayout() = default;
