@@ -4,13 +4,13 @@
 // whole move of a mixer during a drag: the weights and the writes to the morphs, each recorded
 // for undo.
 #include "app/rkapp.h"
+#include "properties/rkfloatproperty.h"
 #include "rkbenchmain.h"
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixerreference.h"
 #include "rkezmixersolver.h"
-#include "properties/rkfloatproperty.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostackhold.h"
 
@@ -21,7 +21,8 @@
 
 #include <memory>
 
-namespace {
+namespace
+{
 
 QVector<QPoint> scatter(int count)
 {
@@ -42,8 +43,7 @@ QPoint driverAt(int64_t step)
 }
 
 // One move's weights, the system rebuilt for the layout as a drag does it, by the given way.
-template <typename Weights>
-void driveWeights(benchmark::State& state, Weights weightsOf)
+template <typename Weights> void driveWeights(benchmark::State& state, Weights weightsOf)
 {
     const QVector<QPoint> points = scatter(int(state.range(0)));
     RkEzMixerSolver solver;

@@ -1,19 +1,19 @@
-#include "render/rk3dviewport.h"
-#include "rkaboutplugins.h"
 #include "actions/rkactionmgr.h"
 #include "app/rkapp.h"
-#include "demo/rkdemoscene.h"
-#include "rkdemotools.h"
-#include "support/rkgldriver.h"
-#include "rkhostactions.h"
 #include "app/rkmainwindow.h"
+#include "app/rkstyle.h"
+#include "demo/rkdemoscene.h"
 #include "panes/rkpanemgr.h"
 #include "plugin/rkpluginmgr.h"
-#include "scene/rkscene.h"
+#include "render/rk3dviewport.h"
+#include "rkaboutplugins.h"
+#include "rkdemotools.h"
+#include "rkhostactions.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
 #include "rkscriptsurface.h"
-#include "app/rkstyle.h"
+#include "scene/rkscene.h"
+#include "support/rkgldriver.h"
 #include "viewport/rkviewportmgr.h"
 
 #include <QApplication>
@@ -29,7 +29,8 @@
 
 #include <cstdio>
 
-namespace {
+namespace
+{
 
 // --plugins, then $RK_PLUGIN_PATH, then the installed plug-in folder next to the binary, then the
 // build tree's.

@@ -21,8 +21,8 @@ RkAboutPluginsDialog::RkAboutPluginsDialog(RkPluginMgr* pluginMgr, QWidget* pare
     tree->setHeaderLabels({tr("Plug-in / Class"), tr("Details")});
     const QList<RkPlugin*> plugins = pluginMgr->getPlugins();
     for (RkPlugin* plugin : plugins) {
-        auto* top = new QTreeWidgetItem(tree, {plugin->getName(),
-                                               RkPlugin::versionToString(plugin->getVersion())});
+        auto* top = new QTreeWidgetItem(
+            tree, {plugin->getName(), RkPlugin::versionToString(plugin->getVersion())});
         new QTreeWidgetItem(top, {tr("Author"), plugin->getAuthor()});
         new QTreeWidgetItem(top, {tr("Version"), RkPlugin::versionToString(plugin->getVersion())});
         auto* description = new QTreeWidgetItem(top, {tr("Description"), plugin->getDescription()});
@@ -49,7 +49,8 @@ QString rkPluginListing(RkPluginMgr* pluginMgr)
         text += QStringLiteral("%1\n").arg(plugin->getName());
         text += QStringLiteral("  file: %1\n").arg(pluginMgr->getPluginFilePath(plugin));
         text += QStringLiteral("  author: %1\n").arg(plugin->getAuthor());
-        text += QStringLiteral("  version: %1\n").arg(RkPlugin::versionToString(plugin->getVersion()));
+        text +=
+            QStringLiteral("  version: %1\n").arg(RkPlugin::versionToString(plugin->getVersion()));
         text += QStringLiteral("  description: %1\n").arg(plugin->getDescription());
         text += QStringLiteral("  classes:\n");
         for (RkClassFactory* factory : plugin->getClassFactories()) {

@@ -7,7 +7,8 @@ class RkPluginMgr;
 
 // Help > About Plug-ins: every loaded module with its name, author, dotted version, description and
 // classes.
-class RkAboutPluginsDialog : public QDialog {
+class RkAboutPluginsDialog : public QDialog
+{
     Q_OBJECT
 public:
     explicit RkAboutPluginsDialog(RkPluginMgr* pluginMgr, QWidget* parent = nullptr);

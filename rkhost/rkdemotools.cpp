@@ -13,9 +13,11 @@
 #include <QPointer>
 #include <QStyle>
 
-namespace {
+namespace
+{
 
-class RkToolResetAction : public RkAction {
+class RkToolResetAction : public RkAction
+{
     Q_OBJECT
 public:
     RkToolResetAction() : RkAction(tr("Reset Tool Options"), tr("Reset the tool's options")) {}
@@ -26,7 +28,8 @@ public:
     }
 };
 
-class RkToolSnapAction : public RkAction {
+class RkToolSnapAction : public RkAction
+{
     Q_OBJECT
 public:
     RkToolSnapAction() : RkAction(tr("Snap to Grid"), tr("Snap moves to the grid"))
@@ -36,7 +39,8 @@ public:
 };
 
 // Tools keep their options widget only while its owner (the pane's widget stack) keeps it.
-class RkUniversalTool : public RkViewTool {
+class RkUniversalTool : public RkViewTool
+{
     Q_OBJECT
 public:
     RkUniversalTool() : RkViewTool(QStringLiteral("Universal")) { setMenu(false); }
@@ -74,7 +78,8 @@ private:
     bool m_advanced = false;
 };
 
-class RkTranslateTool : public RkViewTool {
+class RkTranslateTool : public RkViewTool
+{
     Q_OBJECT
 public:
     RkTranslateTool() : RkViewTool(QStringLiteral("Translate")) {}

@@ -1,14 +1,16 @@
 #include "rkhostactions.h"
 
-#include "rkaboutplugins.h"
 #include "actions/rkaction.h"
 #include "actions/rkactionmgr.h"
 #include "app/rkapp.h"
 #include "app/rkmainwindow.h"
+#include "rkaboutplugins.h"
 
-namespace {
+namespace
+{
 
-class RkQuitAction : public RkAction {
+class RkQuitAction : public RkAction
+{
     Q_OBJECT
 public:
     RkQuitAction() : RkAction(tr("&Quit"), tr("Quit the application")) {}
@@ -22,7 +24,8 @@ public:
     }
 };
 
-class RkAboutPluginsAction : public RkAction {
+class RkAboutPluginsAction : public RkAction
+{
     Q_OBJECT
 public:
     RkAboutPluginsAction()

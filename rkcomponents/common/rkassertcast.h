@@ -7,13 +7,13 @@
 // Resolves a stored object pointer to the class it must have. Null stays null; an object of
 // another class throws a QString, so that a scene file naming the wrong class fails loudly at the
 // place that resolves it instead of being used as the wrong type.
-class RkAssertCast {
+class RkAssertCast
+{
     Q_DECLARE_TR_FUNCTIONS(RkAssertCast)
 public:
     static QString failureMessage();
 
-    template <typename T>
-    static T* cast(QObject* object)
+    template <typename T> static T* cast(QObject* object)
     {
         if (!object)
             return nullptr;
@@ -23,8 +23,7 @@ public:
     }
 };
 
-template <typename T>
-T* rkAssertCast(QObject* object)
+template <typename T> T* rkAssertCast(QObject* object)
 {
     return RkAssertCast::cast<T>(object);
 }

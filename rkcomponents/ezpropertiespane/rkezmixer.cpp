@@ -1,16 +1,17 @@
 #include "rkezmixer.h"
 
+#include "io/rkinfile.h"
+#include "io/rkoutfile.h"
+#include "properties/rkfloatproperty.h"
 #include "rkassertcast.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixersolver.h"
-#include "properties/rkfloatproperty.h"
-#include "io/rkinfile.h"
-#include "io/rkoutfile.h"
 
 #include <cmath>
 
-namespace {
+namespace
+{
 constexpr short kControlsSection = 0x220;
 constexpr short kDriverSection = 0x230;
 } // namespace

@@ -11,7 +11,8 @@ class RkEzMixerDriver;
 
 // A set of morphs placed on a square field and blended by one handle: every move of the driver
 // sets each control's property to its value times the control's interpolated weight.
-class RkEzMixer : public RkBase {
+class RkEzMixer : public RkBase
+{
     Q_OBJECT
 public:
     RkEzMixer();

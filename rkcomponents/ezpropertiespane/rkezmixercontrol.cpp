@@ -1,14 +1,15 @@
 #include "rkezmixercontrol.h"
 
-#include "rkassertcast.h"
-#include "properties/rkfloatproperty.h"
 #include "io/rkinfile.h"
 #include "io/rkoutfile.h"
+#include "properties/rkfloatproperty.h"
+#include "rkassertcast.h"
 
 #include <QBuffer>
 #include <QPointer>
 
-namespace {
+namespace
+{
 constexpr short kPropertySection = 0x221;
 constexpr short kImageSection = 0x222;
 constexpr short kPointSection = 0x223;

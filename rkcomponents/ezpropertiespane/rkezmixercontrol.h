@@ -12,7 +12,8 @@ class RkFloatProperty;
 
 // One morph taking part in a mixer: the property it drives, the property's value at full
 // weight, its thumbnail and its point on the mixer field.
-class RkEzMixerControl : public RkBase {
+class RkEzMixerControl : public RkBase
+{
     Q_OBJECT
 public:
     RkEzMixerControl();

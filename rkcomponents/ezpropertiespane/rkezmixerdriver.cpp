@@ -4,7 +4,8 @@
 #include "io/rkoutfile.h"
 #include "undo/rkundostackhold.h"
 
-namespace {
+namespace
+{
 constexpr short kPointSection = 0x231;
 }
 

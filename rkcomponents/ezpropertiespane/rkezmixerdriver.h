@@ -8,7 +8,8 @@
 
 // The handle of a mixer: a point on the mixer field that the user drags. Every move is
 // announced with moved(); one drag, from startDrag() to endDrag(), is one undo entry.
-class RkEzMixerDriver : public RkBase {
+class RkEzMixerDriver : public RkBase
+{
     Q_OBJECT
 public:
     RkEzMixerDriver();

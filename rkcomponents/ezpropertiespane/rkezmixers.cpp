@@ -1,11 +1,12 @@
 #include "rkezmixers.h"
 
-#include "rkassertcast.h"
-#include "rkezmixer.h"
 #include "io/rkinfile.h"
 #include "io/rkoutfile.h"
+#include "rkassertcast.h"
+#include "rkezmixer.h"
 
-namespace {
+namespace
+{
 constexpr short kMixersSection = 0x210;
 }
 

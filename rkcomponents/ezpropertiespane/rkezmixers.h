@@ -8,7 +8,8 @@ class RkEzMixer;
 
 // The custom mixers of a figure, kept on its node as the element data "RkEzMixers" and stored
 // with the scene. The order of the mixers is the order of the Shape tab's mixer tabs.
-class RkEzMixers : public RkElementData {
+class RkEzMixers : public RkElementData
+{
     Q_OBJECT
 public:
     RkEzMixers();

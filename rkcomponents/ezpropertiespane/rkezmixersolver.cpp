@@ -3,7 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
-namespace {
+namespace
+{
 
 // Points whose direction from the first point is within this (1 - |cos|) of the first pair's
 // direction count as lying on that line.

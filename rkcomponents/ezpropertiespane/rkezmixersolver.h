@@ -11,7 +11,8 @@
 // radial term, plus a linear term along the controls' line or over the plane).
 //
 // Plain numbers only, so that tests and benchmarks can drive it without a scene or a window.
-class RkEzMixerSolver {
+class RkEzMixerSolver
+{
 public:
     enum Layout {
         None,  // fewer than two controls: nothing to interpolate

@@ -1,12 +1,12 @@
 #include "rkcomponentsplugin.h"
 
+#include "plugin/rkplugin.h"
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
 #include "rkfullscreenaction.h"
 #include "rkfullscreenactionfactory.h"
-#include "plugin/rkplugin.h"
 #include "rktclassfactory.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
@@ -17,7 +17,8 @@
 // as written, case included. Static destruction runs in reverse: the factories from the last to
 // the first, the plug-in object after them.
 
-namespace {
+namespace
+{
 
 struct ComponentsPlugin : RkPlugin {
     ComponentsPlugin() : RkPlugin(QStringLiteral("Interface Components"), QString(), QString(), 0)
@@ -37,8 +38,9 @@ ComponentsPlugin s_plugin;
 // One named factory per script-enabled class: a static GUID, the factory class and its static
 // instance, which adds itself to the plug-in object.
 #define RK_NAMED_FACTORY(Class, guidText)                                                          \
-    static const RkGUID Class##_GUID = RkGUID::fromString(QStringLiteral(guidText));              \
-    class Class##Factory : public RkTClassFactory<Class> {                                         \
+    static const RkGUID Class##_GUID = RkGUID::fromString(QStringLiteral(guidText));               \
+    class Class##Factory : public RkTClassFactory<Class>                                           \
+    {                                                                                              \
     public:                                                                                        \
         Class##Factory() : RkTClassFactory<Class>(&Class::staticMetaObject, Class##_GUID)          \
         {                                                                                          \

@@ -3,7 +3,8 @@
 #include "plugin/rkclassfactory.h"
 
 // Makes RkFullScreenAction. The action is not made known to the script engine.
-class RkFullScreenActionFactory : public RkClassFactory {
+class RkFullScreenActionFactory : public RkClassFactory
+{
 public:
     RkFullScreenActionFactory(const QMetaObject* metaObject, const RkGUID& guid);
 

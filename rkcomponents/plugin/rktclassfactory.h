@@ -3,8 +3,8 @@
 #include "rktcustomclassfactory.h"
 
 // The factory of a class T with a parameterless constructor.
-template <typename T>
-class RkTClassFactory : public RkTCustomClassFactory<T> {
+template <typename T> class RkTClassFactory : public RkTCustomClassFactory<T>
+{
 public:
     RkTClassFactory(const QMetaObject* metaObject, const RkGUID& guid,
                     QScriptEngine::ValueOwnership ownership = QScriptEngine::QtOwnership)

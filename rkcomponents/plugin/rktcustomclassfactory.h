@@ -9,8 +9,8 @@
 
 // A factory that makes its class T known to the host's script engine: scripts can construct T by
 // its class name ("new RkToolPane()") and pass T pointers ("RkToolPane*") in and out of calls.
-template <typename T>
-class RkTCustomClassFactory : public RkClassFactory {
+template <typename T> class RkTCustomClassFactory : public RkClassFactory
+{
 public:
     RkTCustomClassFactory(const QMetaObject* metaObject, const RkGUID& guid,
                           QScriptEngine::ValueOwnership ownership)

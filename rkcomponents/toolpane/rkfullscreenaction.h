@@ -3,7 +3,8 @@
 #include "actions/rkaction.h"
 
 // View > Go Full Screen: asks the main window to let the main viewport fill the screen.
-class RkFullScreenAction : public RkAction {
+class RkFullScreenAction : public RkAction
+{
     Q_OBJECT
 public:
     RkFullScreenAction();

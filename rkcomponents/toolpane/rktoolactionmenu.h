@@ -8,7 +8,8 @@ class RkToolPane;
 
 // The Tool pane's options menu: a copy of the active tool's options menu, then a Close entry that
 // closes the pane.
-class RkToolActionMenu : public RkActionMenu {
+class RkToolActionMenu : public RkActionMenu
+{
 public:
     // Copies the tool's menu when there is one; starts empty otherwise.
     RkToolActionMenu(RkToolPane* pane, const RkActionMenu* toolMenu);

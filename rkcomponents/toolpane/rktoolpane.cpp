@@ -12,7 +12,8 @@
 #include <QStyle>
 #include <QVBoxLayout>
 
-namespace {
+namespace
+{
 RkViewportMgr* viewportMgr()
 {
     RkMainWindow* mainWindow = rkApp ? rkApp->getInterface() : nullptr;

@@ -9,7 +9,8 @@ class QStackedWidget;
 
 // The Tool tab: the active viewport tool's name, its options widget and, in the pane's options
 // menu, its options menu followed by Close. Follows the viewport manager's active tool.
-class RkToolPane : public RkPane {
+class RkToolPane : public RkPane
+{
     Q_OBJECT
 public:
     RkToolPane();

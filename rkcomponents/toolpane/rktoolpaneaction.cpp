@@ -1,7 +1,7 @@
 #include "rktoolpaneaction.h"
 
-#include "app/rkapp.h"
 #include "actions/rkhelpmgr.h"
+#include "app/rkapp.h"
 
 RkToolPaneAction::RkToolPaneAction() : RkPaneAction(QStringLiteral("RkToolPane"))
 {

@@ -3,7 +3,8 @@
 #include "panes/rkpaneaction.h"
 
 // Shows and hides the Tool tab.
-class RkToolPaneAction : public RkPaneAction {
+class RkToolPaneAction : public RkPaneAction
+{
     Q_OBJECT
 public:
     RkToolPaneAction();

@@ -1,16 +1,16 @@
 #include "demo/rkdemomesh.h"
 
-#include "scene/rkbone.h"
 #include "demo/rkdemoscene.h"
-#include "properties/rkfloatproperty.h"
 #include "geometry/rkmap.h"
+#include "geometry/rkpolymesh.h"
+#include "geometry/rksubdmesh.h"
+#include "properties/rkfloatproperty.h"
+#include "scene/rkbone.h"
 #include "scene/rkmaterial.h"
 #include "scene/rkobject.h"
-#include "geometry/rkpolymesh.h"
 #include "scene/rkscene.h"
 #include "scene/rkshape.h"
 #include "scene/rkskeleton.h"
-#include "geometry/rksubdmesh.h"
 
 #include <QHash>
 

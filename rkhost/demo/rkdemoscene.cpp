@@ -1,11 +1,11 @@
 #include "demo/rkdemoscene.h"
 
 #include "demo/rkdemomesh.h"
-#include "scene/rkbone.h"
 #include "properties/rkboolproperty.h"
-#include "scene/rkcamera.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkintproperty.h"
+#include "scene/rkbone.h"
+#include "scene/rkcamera.h"
 #include "scene/rklight.h"
 #include "scene/rkscene.h"
 #include "scene/rkskeleton.h"

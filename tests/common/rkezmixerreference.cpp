@@ -6,7 +6,8 @@
 #include <cmath>
 #include <vector>
 
-namespace {
+namespace
+{
 
 // The same pivot limit as the solver's, so that both refuse the same systems.
 constexpr double kPivotTolerance = 1e-12;

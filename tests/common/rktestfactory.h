@@ -4,8 +4,8 @@
 #include "plugin/rkguid.h"
 
 // A class factory for test classes: makes T with its parameterless constructor.
-template <typename T>
-class RkTestFactory : public RkClassFactory {
+template <typename T> class RkTestFactory : public RkClassFactory
+{
 public:
     explicit RkTestFactory(const char* guid)
         : RkClassFactory(&T::staticMetaObject, RkGUID::fromString(QLatin1String(guid)))

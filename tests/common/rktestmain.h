@@ -1,9 +1,9 @@
 #pragma once
 
 #include "app/rkapp.h"
-#include "support/rkgldriver.h"
 #include "app/rkmainwindow.h"
 #include "app/rkstyle.h"
+#include "support/rkgldriver.h"
 
 #include <QApplication>
 #include <QStandardPaths>

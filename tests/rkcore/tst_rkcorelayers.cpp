@@ -9,7 +9,8 @@
 #include <QSet>
 #include <QtTest>
 
-namespace {
+namespace
+{
 
 const QStringList Layers = {QStringLiteral("base"), QStringLiteral("model"),
                             QStringLiteral("shell")};
@@ -47,7 +48,8 @@ QString resolve(const QString& root, const QString& included)
 
 Library readLibrary(const QString& root)
 {
-    static const QRegularExpression includeLine(QStringLiteral("^\\s*#\\s*include\\s+\"([^\"]+)\""));
+    static const QRegularExpression includeLine(
+        QStringLiteral("^\\s*#\\s*include\\s+\"([^\"]+)\""));
     Library lib;
     for (const QString& layer : Layers) {
         lib.areas.append(layer);
@@ -111,7 +113,8 @@ QStringList findCycle(const QHash<QString, QSet<QString>>& edges)
 
 } // namespace
 
-class TestRkCoreLayers : public QObject {
+class TestRkCoreLayers : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -135,11 +138,13 @@ void TestRkCoreLayers::includesPointDownwards()
 {
     QStringList faults;
     for (const Include& inc : lib.includes) {
-        const QString where = QStringLiteral("%1:%2: \"%3\"").arg(inc.file).arg(inc.line).arg(inc.text);
+        const QString where =
+            QStringLiteral("%1:%2: \"%3\"").arg(inc.file).arg(inc.line).arg(inc.text);
         if (inc.toArea.isEmpty())
             faults << where + QStringLiteral(" is not a header of the library");
         else if (layerOf(inc.toArea) > layerOf(inc.fromArea))
-            faults << where + QStringLiteral(" reaches up from %1 into %2").arg(inc.fromArea, inc.toArea);
+            faults << where + QStringLiteral(" reaches up from %1 into %2")
+                                  .arg(inc.fromArea, inc.toArea);
     }
     QVERIFY2(faults.isEmpty(), qPrintable(faults.join(QLatin1Char('\n'))));
 }

@@ -5,15 +5,16 @@
 #include <QProcess>
 #include <QTemporaryDir>
 
-namespace {
+namespace
+{
 struct Run {
     int exitCode = -1;
     QString out;
     QString err;
 };
 
-Run runHost(const QStringList& arguments, const QProcessEnvironment& env =
-                                               QProcessEnvironment::systemEnvironment())
+Run runHost(const QStringList& arguments,
+            const QProcessEnvironment& env = QProcessEnvironment::systemEnvironment())
 {
     QProcess host;
     host.setProcessEnvironment(env);
@@ -41,7 +42,8 @@ QString writeScript(const QTemporaryDir& dir, const QString& name, const QString
 }
 } // namespace
 
-class TestRkHost : public QObject {
+class TestRkHost : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void screenshotShowsTheDockedToolTab();
@@ -92,8 +94,8 @@ void TestRkHost::scriptConstructsModuleClasses()
     const Run run = runHost({QStringLiteral("--script"), script});
     QVERIFY2(run.exitCode == 0, qPrintable(run.err));
     QCOMPARE(run.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts),
-             QStringList({"made Tool", "dock true Tool", "tool Universal",
-                          "about true About Plug-ins"}));
+             QStringList(
+                 {"made Tool", "dock true Tool", "tool Universal", "about true About Plug-ins"}));
 }
 
 void TestRkHost::scriptErrorExitsNonZero()
@@ -140,7 +142,8 @@ void TestRkHost::listPlugins()
     QVERIFY(run.out.contains(QStringLiteral("author: Morvane 3D, Inc")));
     QVERIFY(run.out.contains(QStringLiteral("version: 2.0.8.32")));
     QVERIFY(run.out.contains(QStringLiteral("RkToolPane 56C51F21-B8D3-4895-9E00-6C8975018A22")));
-    QVERIFY(run.out.contains(QStringLiteral("RkFullScreenAction 8A77FD58-BE3E-4434-93EF-BB41DA6DBDB4")));
+    QVERIFY(run.out.contains(
+        QStringLiteral("RkFullScreenAction 8A77FD58-BE3E-4434-93EF-BB41DA6DBDB4")));
 }
 
 void TestRkHost::refusedModulesLeaveTheHostRunning()

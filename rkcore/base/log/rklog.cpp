@@ -2,7 +2,8 @@
 
 #include <utility>
 
-namespace {
+namespace
+{
 RkLogHandler& currentHandler()
 {
     static RkLogHandler handler;

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "rkcoreglobal.h"
 #include "plugin/rkguid.h"
+#include "rkcoreglobal.h"
 
 #include <QScriptEngine>
 #include <QString>
@@ -14,7 +14,8 @@ class QScriptValue;
 // Creates the objects of one class for the host: panes, actions, views and stored data are all made
 // through their factory, found by class name or by GUID. Factories are owned by the module that
 // defines them (usually static objects); the host only keeps pointers.
-class RKCORE_EXPORT RkClassFactory {
+class RKCORE_EXPORT RkClassFactory
+{
 public:
     RkClassFactory(const QMetaObject* metaObject, const RkGUID& guid);
     virtual ~RkClassFactory();

@@ -8,7 +8,8 @@
 // A class identifier. It keeps the text exactly as it was given (stored scenes and module tables
 // carry mixed-case GUIDs that must round-trip unchanged) and compares by the 128-bit value, so
 // "4dec" and "4DEC" name the same class.
-class RKCORE_EXPORT RkGUID {
+class RKCORE_EXPORT RkGUID
+{
 public:
     RkGUID() = default;
 

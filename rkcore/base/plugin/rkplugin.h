@@ -9,7 +9,8 @@ class RkClassFactory;
 
 // What a module tells the host about itself: name, author, packed version, description and its
 // class factories in registration order. The module owns the object and its factories.
-class RKCORE_EXPORT RkPlugin {
+class RKCORE_EXPORT RkPlugin
+{
 public:
     RkPlugin(const QString& name, const QString& author, const QString& description,
              quint32 version);

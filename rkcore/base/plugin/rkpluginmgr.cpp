@@ -12,7 +12,8 @@
 #include <QPointer>
 #include <QScriptEngine>
 
-namespace {
+namespace
+{
 using SDKVersionFn = quint32 (*)();
 using PluginDefinitionFn = RkPlugin* (*)();
 
@@ -64,9 +65,9 @@ bool RkPluginMgr::loadModule(const QString& filePath)
     QString refusal;
     RkPlugin* plugin = nullptr;
     if (!sdkVersion || !definition) {
-        refusal = tr("Plug-in %1 refused: it lacks the entry point %2")
-                      .arg(name, QLatin1String(!sdkVersion ? "getSDKVersion"
-                                                           : "getPluginDefinition"));
+        refusal =
+            tr("Plug-in %1 refused: it lacks the entry point %2")
+                .arg(name, QLatin1String(!sdkVersion ? "getSDKVersion" : "getPluginDefinition"));
     } else if ((sdkVersion() >> 24) != (SDKVersion >> 24)) {
         refusal = tr("Plug-in %1 refused: built for SDK %2, this host has SDK %3")
                       .arg(name, RkPlugin::versionToString(sdkVersion()),

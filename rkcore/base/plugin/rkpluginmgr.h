@@ -17,7 +17,8 @@ class RkPlugin;
 // by class name or GUID, for the classes of modules and for the core's own stored classes alike.
 // Owned by RkApp. Loaded libraries stay loaded until the process ends: objects made by a module
 // (panes, actions, stored data) may live as long as the application.
-class RKCORE_EXPORT RkPluginMgr : public QObject {
+class RKCORE_EXPORT RkPluginMgr : public QObject
+{
     Q_OBJECT
 public:
     // The SDK version of this host core, packed 3.0.1.61. A module built against another major

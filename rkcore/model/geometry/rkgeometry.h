@@ -1,7 +1,7 @@
 #pragma once
 
-#include "rkcoreglobal.h"
 #include "geometry/rkvec3.h"
+#include "rkcoreglobal.h"
 
 #include <QVector>
 

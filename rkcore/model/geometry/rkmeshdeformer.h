@@ -1,8 +1,8 @@
 #pragma once
 
-#include "rkcoreglobal.h"
 #include "geometry/rkvec3.h"
 #include "geometry/rkxform.h"
+#include "rkcoreglobal.h"
 
 #include <QString>
 #include <QVector>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "rkcoreglobal.h"
 #include "geometry/rkvec3.h"
+#include "rkcoreglobal.h"
 
 // An affine transform: a 3x3 linear part (row-major; a rotation, possibly scaled) followed by a
 // translation. p' = R p + t.

@@ -6,8 +6,9 @@
 
 #include <memory>
 
-// A named value of a scene element (its QObject parent; RkElement::elementOf finds it), shown to the user under its label in the group its path
-// names. Every value change made while an undo hold is open is recorded on rkUndoStack.
+// A named value of a scene element (its QObject parent; RkElement::elementOf finds it), shown to
+// the user under its label in the group its path names. Every value change made while an undo hold
+// is open is recorded on rkUndoStack.
 class RKCORE_EXPORT RkProperty : public RkBase
 {
     Q_OBJECT

@@ -1,8 +1,8 @@
 #include "scene/rkelement.h"
 
-#include "scene/rkelementdata.h"
 #include "properties/rkproperty.h"
 #include "properties/rkpropertygrouptree.h"
+#include "scene/rkelementdata.h"
 
 #include <QHash>
 #include <QPointer>

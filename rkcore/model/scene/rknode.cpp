@@ -1,14 +1,14 @@
 #include "scene/rknode.h"
 
-#include "properties/rkboolproperty.h"
-#include "scene/rkelementdata.h"
-#include "properties/rkfloatproperty.h"
 #include "io/rkinfile.h"
-#include "properties/rkintproperty.h"
-#include "scene/rkobject.h"
 #include "io/rkoutfile.h"
+#include "properties/rkboolproperty.h"
+#include "properties/rkfloatproperty.h"
+#include "properties/rkintproperty.h"
 #include "properties/rkpropertygroup.h"
 #include "properties/rkpropertygrouptree.h"
+#include "scene/rkelementdata.h"
+#include "scene/rkobject.h"
 #include "scene/rkskeleton.h"
 
 #include <QPointer>

@@ -58,9 +58,9 @@ public:
     // Replaces the object (the old one is deleted) and emits uvsChanged().
     void setObject(RkObject* object);
 
-    // Names the content the node is built from (a key such as "demo:figure"); a scene file stores the key,
-    // and the loader asks the builder registered for it (RkScene::registerSourceBuilder) to
-    // rebuild what the file does not hold, such as geometry.
+    // Names the content the node is built from (a key such as "demo:figure"); a scene file stores
+    // the key, and the loader asks the builder registered for it (RkScene::registerSourceBuilder)
+    // to rebuild what the file does not hold, such as geometry.
     QString getSource() const;
     void setSource(const QString& source);
 

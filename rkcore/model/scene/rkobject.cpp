@@ -1,7 +1,7 @@
 #include "scene/rkobject.h"
 
-#include "properties/rkfloatproperty.h"
 #include "geometry/rkgeometry.h"
+#include "properties/rkfloatproperty.h"
 #include "scene/rkmaterial.h"
 #include "scene/rknode.h"
 #include "scene/rkshape.h"

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "scene/rkelement.h"
 #include "geometry/rkmeshdeformer.h"
 #include "geometry/rkvec3.h"
+#include "scene/rkelement.h"
 
 #include <QVector>
 

@@ -7,9 +7,10 @@
 #include "scene/rklight.h"
 #include "scene/rkskeleton.h"
 
-namespace {
-template <typename T>
-class SceneClassFactory : public RkClassFactory {
+namespace
+{
+template <typename T> class SceneClassFactory : public RkClassFactory
+{
 public:
     explicit SceneClassFactory(const char* guid)
         : RkClassFactory(&T::staticMetaObject, RkGUID::fromString(QLatin1String(guid)))

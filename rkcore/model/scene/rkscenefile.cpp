@@ -89,8 +89,8 @@ QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
             const auto it = indexOf.constFind(owner);
             if (it == indexOf.constEnd() || !qobject_cast<const RkNode*>(owner)) {
                 rkLog(QStringLiteral("Saving: a pointer to property \"%1\" of something that "
-                                    "is not saved is stored as null")
-                         .arg(p->getName()));
+                                     "is not saved is stored as null")
+                          .arg(p->getName()));
                 kind = PointerNull;
                 return true;
             }
@@ -103,8 +103,8 @@ QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
             const auto it = indexOf.constFind(object);
             if (it == indexOf.constEnd()) {
                 rkLog(QStringLiteral("Saving: a pointer to %1, which is not in the scene, is "
-                                    "stored as null")
-                         .arg(describe(object)));
+                                     "stored as null")
+                          .arg(describe(object)));
                 kind = PointerNull;
                 return true;
             }
@@ -526,8 +526,8 @@ bool RkSceneReader::read(const QByteArray& bytes, const QString& fileName)
     for (size_t i = 0; i < d->objects.size(); ++i) {
         if (!d->isNode[i] && !d->adopted[i] && d->objects[i]) {
             rkLog(QStringLiteral("Loading: object %1 (%2) belongs to nothing and was dropped")
-                     .arg(i)
-                     .arg(d->objects[i]->className()));
+                      .arg(i)
+                      .arg(d->objects[i]->className()));
             delete d->objects[i].data();
         }
     }
@@ -570,10 +570,10 @@ void RkSceneReader::postLoad()
             object->postLoadFile(&d->file);
         } catch (const QString& message) {
             rkLog(QStringLiteral("Loading: %1 failed after the load: %2")
-                     .arg(describe(object), message));
+                      .arg(describe(object), message));
         } catch (const std::exception& e) {
             rkLog(QStringLiteral("Loading: %1 failed after the load: %2")
-                     .arg(describe(object), QString::fromLocal8Bit(e.what())));
+                      .arg(describe(object), QString::fromLocal8Bit(e.what())));
         }
     }
 }

@@ -10,7 +10,8 @@
 // Base of every host and module action. The action manager creates actions through their class
 // factories, calls init(), and lists them in the main menus under getDefaultMenuPath(). Triggering
 // runs executeAction(), or toggleAction(checked) for a checkable action.
-class RKCORE_EXPORT RkAction : public QAction {
+class RKCORE_EXPORT RkAction : public QAction
+{
     Q_OBJECT
 public:
     RkAction(const QString& text, const QString& description, QObject* parent = nullptr);

@@ -21,9 +21,9 @@ struct RkActionMenu::Entry {
     Entry& operator=(Entry&&) = default;
 };
 
-namespace {
-template <typename Vector>
-typename Vector::iterator insertPosition(Vector& entries, int index)
+namespace
+{
+template <typename Vector> typename Vector::iterator insertPosition(Vector& entries, int index)
 {
     if (index < 0 || index > int(entries.size()))
         return entries.end();

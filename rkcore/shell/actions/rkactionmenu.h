@@ -13,7 +13,8 @@ class QMenu;
 // A menu described by action class names, separators and sub-menus. Panes and viewport tools hand
 // these to the host, which builds the real QMenu from them when the menu is shown, taking each
 // action from the action manager. Copying copies the whole tree.
-class RKCORE_EXPORT RkActionMenu {
+class RKCORE_EXPORT RkActionMenu
+{
     Q_DECLARE_TR_FUNCTIONS(RkActionMenu)
 public:
     enum EntryType { Action, Separator, SubMenu };

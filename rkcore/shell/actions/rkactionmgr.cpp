@@ -15,7 +15,8 @@
 
 #include <algorithm>
 
-namespace {
+namespace
+{
 QString withoutMnemonic(QString text)
 {
     text.remove(QLatin1Char('&'));
@@ -40,7 +41,8 @@ struct RkActionMgr::Private {
     QSet<RkAction*> placed;
 };
 
-namespace {
+namespace
+{
 QPointer<RkActionMgr> currentMgr;
 }
 

@@ -14,7 +14,8 @@ class QMainWindow;
 
 // Keeps one instance of every action class, made through the class factories on first use, and
 // lays the actions out in the main window's menus and tool bars. Owned by the main window.
-class RKCORE_EXPORT RkActionMgr : public QObject {
+class RKCORE_EXPORT RkActionMgr : public QObject
+{
     Q_OBJECT
 public:
     explicit RkActionMgr(QMainWindow* mainWindow);

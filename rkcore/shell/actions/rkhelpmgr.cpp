@@ -4,7 +4,8 @@
 
 #include <QWidget>
 
-namespace {
+namespace
+{
 const char* const helpTopicProperty = "rkHelpTopic";
 
 QString plainText(QString text)

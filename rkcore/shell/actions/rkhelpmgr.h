@@ -10,7 +10,8 @@ class RkAction;
 // Online help: tool tips and status tips of actions and widgets. Owned by RkApp. The help lives on
 // the objects themselves, so the operations need no manager object and are static: callers may
 // still reach them through rkApp->getHelpMgr().
-class RKCORE_EXPORT RkHelpMgr : public QObject {
+class RKCORE_EXPORT RkHelpMgr : public QObject
+{
     Q_OBJECT
 public:
     explicit RkHelpMgr(QObject* parent = nullptr);

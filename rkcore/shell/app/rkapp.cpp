@@ -18,7 +18,8 @@
 
 RkApp* rkApp = nullptr;
 
-namespace {
+namespace
+{
 int busyCursorDepth = 0;
 
 // print() in scripts writes one line to stdout, its arguments separated by spaces.

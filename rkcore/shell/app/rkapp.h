@@ -18,7 +18,8 @@ class RkUndoStack;
 // The application core: owns the scene, the undo stack, the script engine, the plug-in manager and
 // the help manager, and knows the main window when there is one. Exactly one lives at a time;
 // rkApp points at it.
-class RKCORE_EXPORT RkApp : public QObject {
+class RKCORE_EXPORT RkApp : public QObject
+{
     Q_OBJECT
 public:
     explicit RkApp(QObject* parent = nullptr);

@@ -14,7 +14,8 @@ class RkViewportMgr;
 
 // The host's main window: the main viewport in the centre, panes docked around it, the menus and
 // tool bars. While it exists rkApp->getInterface() answers it.
-class RKCORE_EXPORT RkMainWindow : public QMainWindow {
+class RKCORE_EXPORT RkMainWindow : public QMainWindow
+{
     Q_OBJECT
 public:
     explicit RkMainWindow(QWidget* parent = nullptr);

@@ -6,7 +6,8 @@
 #include <QStyleFactory>
 #include <QWidget>
 
-namespace {
+namespace
+{
 
 // Custom pixel metrics, as offsets from QStyle::PM_CustomBase. Sizes are in device-independent
 // pixels and suit the default 9-10 pt UI font.
@@ -152,8 +153,7 @@ QPixmap RkStyle::standardPixmap(StandardPixmap pixmap, const QStyleOption* optio
         const int offset = int(pixmap - SP_CustomBase);
         if (!isCustomPixmap(offset))
             return QPixmap();
-        return drawCustomPixmap(offset, 16,
-                                widget ? widget->palette() : QApplication::palette());
+        return drawCustomPixmap(offset, 16, widget ? widget->palette() : QApplication::palette());
     }
     return QProxyStyle::standardPixmap(pixmap, option, widget);
 }

@@ -8,7 +8,8 @@
 // The host style, installed application-wide. It adds the custom pixel metrics and the custom
 // standard pixmaps that panes and views size and decorate themselves with (table in rkstyle.cpp)
 // and otherwise defers to the base style (Fusion unless another is given).
-class RKCORE_EXPORT RkStyle : public QProxyStyle {
+class RKCORE_EXPORT RkStyle : public QProxyStyle
+{
     Q_OBJECT
 public:
     // Offsets from QStyle::PM_CustomBase.

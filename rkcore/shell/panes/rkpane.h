@@ -12,7 +12,8 @@ class RkPaneSettings;
 
 // Base of every dockable pane. The pane manager docks it under its tab label, shows its options
 // menu from a button on the dock, and loads and stores its settings.
-class RKCORE_EXPORT RkPane : public QWidget {
+class RKCORE_EXPORT RkPane : public QWidget
+{
     Q_OBJECT
 public:
     explicit RkPane(const QString& label, QWidget* parent = nullptr);

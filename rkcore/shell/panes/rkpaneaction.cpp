@@ -32,8 +32,7 @@ void RkPaneAction::init()
     RkPaneMgr* paneMgr = RkPaneMgr::current();
     if (!paneMgr)
         return;
-    connect(paneMgr, &RkPaneMgr::paneVisibilityChanged, this,
-            &RkPaneAction::paneVisibilityChanged);
+    connect(paneMgr, &RkPaneMgr::paneVisibilityChanged, this, &RkPaneAction::paneVisibilityChanged);
     if (RkPane* pane = paneMgr->findPane(m_paneClassName)) {
         setText(pane->getLabel());
         setDescription(tr("Show or hide the %1 pane").arg(pane->getLabel()));

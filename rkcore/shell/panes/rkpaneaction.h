@@ -4,7 +4,8 @@
 
 // Shows and hides the pane of one class. Checkable; its check mark follows the pane's visibility,
 // whoever shows or hides the pane. Listed under Window > Panes.
-class RKCORE_EXPORT RkPaneAction : public RkAction {
+class RKCORE_EXPORT RkPaneAction : public RkAction
+{
     Q_OBJECT
 public:
     explicit RkPaneAction(const QString& paneClassName, QObject* parent = nullptr);

@@ -1,9 +1,9 @@
 #include "panes/rkpanemgr.h"
 
 #include "log/rklog.h"
-#include "plugin/rkclassfactory.h"
 #include "panes/rkpane.h"
 #include "panes/rkpanesettings.h"
+#include "plugin/rkclassfactory.h"
 #include "plugin/rkpluginmgr.h"
 
 #include <QAction>
@@ -17,7 +17,8 @@
 #include <QStyle>
 #include <QToolButton>
 
-namespace {
+namespace
+{
 // The dock's title bar: the pane's label, a button with the pane's options menu and a close button.
 QWidget* makeTitleBar(QDockWidget* dock, RkPane* pane)
 {
@@ -70,12 +71,12 @@ struct RkPaneMgr::Private {
     QString settingsFile;
 };
 
-namespace {
+namespace
+{
 QPointer<RkPaneMgr> currentMgr;
 }
 
-RkPaneMgr::RkPaneMgr(QMainWindow* mainWindow)
-    : QObject(mainWindow), d(std::make_unique<Private>())
+RkPaneMgr::RkPaneMgr(QMainWindow* mainWindow) : QObject(mainWindow), d(std::make_unique<Private>())
 {
     d->mainWindow = mainWindow;
     currentMgr = this;

@@ -15,7 +15,8 @@ class RkPane;
 // Creates panes through their class factories, docks them in the main window (tabbed together on
 // the right), shows each pane's options menu from a button on its dock, and keeps every pane
 // class's settings between runs. Owned by the main window.
-class RKCORE_EXPORT RkPaneMgr : public QObject {
+class RKCORE_EXPORT RkPaneMgr : public QObject
+{
     Q_OBJECT
 public:
     explicit RkPaneMgr(QMainWindow* mainWindow);

@@ -7,7 +7,8 @@
 #include <QVariantMap>
 
 // A flat set of named values. The owner decides where it is stored (see RkPaneSettings).
-class RKCORE_EXPORT RkSettings {
+class RKCORE_EXPORT RkSettings
+{
 public:
     RkSettings();
     virtual ~RkSettings();

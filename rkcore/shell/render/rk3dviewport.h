@@ -1,7 +1,7 @@
 #pragma once
 
-#include "rkcoreglobal.h"
 #include "render/rkscenerenderer.h"
+#include "rkcoreglobal.h"
 
 #include <QGLWidget>
 

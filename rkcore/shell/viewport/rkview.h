@@ -9,7 +9,8 @@ class RkViewToolBar;
 
 // A view that a viewport shows in place of its 3D picture (RkViewport::setView). It has a tool bar
 // that the view fills in buildToolBar() and lays out itself.
-class RKCORE_EXPORT RkView : public QWidget {
+class RKCORE_EXPORT RkView : public QWidget
+{
     Q_OBJECT
 public:
     explicit RkView(const QString& name, QWidget* parent = nullptr);

@@ -11,7 +11,8 @@ class RkView;
 
 // One viewport: shows its view widget (the 3D picture of the scene) or, for a while, another view
 // in its place (RkView, for example a UV layout). The viewport owns both.
-class RKCORE_EXPORT RkViewport : public QWidget {
+class RKCORE_EXPORT RkViewport : public QWidget
+{
     Q_OBJECT
 public:
     explicit RkViewport(QWidget* parent = nullptr);

@@ -14,7 +14,8 @@ class RkViewport;
 // Knows the viewports and the viewport tools, which viewport is active and which tool. The tools
 // appear as exclusive buttons on the tool bar it makes; picking one makes it the active tool.
 // Owned by the main window.
-class RKCORE_EXPORT RkViewportMgr : public QObject {
+class RKCORE_EXPORT RkViewportMgr : public QObject
+{
     Q_OBJECT
 public:
     explicit RkViewportMgr(QObject* parent = nullptr);

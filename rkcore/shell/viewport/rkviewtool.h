@@ -12,7 +12,8 @@ class RkActionMenu;
 
 // A viewport tool (rotate, translate, select...). Its object name is the name the user sees. The
 // Tool pane shows its options widget and, in the pane's options menu, its options menu.
-class RKCORE_EXPORT RkViewTool : public QObject {
+class RKCORE_EXPORT RkViewTool : public QObject
+{
     Q_OBJECT
 public:
     explicit RkViewTool(const QString& name, QObject* parent = nullptr);

@@ -8,7 +8,8 @@ class QHBoxLayout;
 
 // The strip of controls at the top of a view: widgets gather at the left (side 0) or the right
 // (side 1).
-class RKCORE_EXPORT RkViewToolBar : public QWidget {
+class RKCORE_EXPORT RkViewToolBar : public QWidget
+{
     Q_OBJECT
 public:
     enum Side { Left = 0, Right = 1 };

@@ -4,7 +4,8 @@
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
 
-namespace {
+namespace
+{
 QStringList warnings;
 
 void collect(QtMsgType type, const QMessageLogContext&, const QString& message)
@@ -14,7 +15,8 @@ void collect(QtMsgType type, const QMessageLogContext&, const QString& message)
 }
 } // namespace
 
-class TestRkCommon : public QObject {
+class TestRkCommon : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void sourceWarning();

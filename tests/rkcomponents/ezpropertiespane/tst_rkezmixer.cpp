@@ -4,16 +4,15 @@
 #include "rkezmixers.h"
 
 #include "app/rkapp.h"
-#include "rkcomponentsplugin.h"
-#include "properties/rkfloatproperty.h"
 #include "io/rkoutfile.h"
-#include "plugin/rkpluginmgr.h"
-#include "scene/rkscene.h"
-#include "scene/rkskeleton.h"
 #include "plugin/rkclassfactory.h"
 #include "plugin/rkguid.h"
 #include "plugin/rkpluginmgr.h"
+#include "properties/rkfloatproperty.h"
+#include "rkcomponentsplugin.h"
 #include "rktestmain.h"
+#include "scene/rkscene.h"
+#include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
 
 #include <QPainter>
@@ -24,7 +23,8 @@
 #include <limits>
 #include <memory>
 
-namespace {
+namespace
+{
 
 const QVector<QPoint> kSlots = {{105, 42}, {168, 127}, {105, 212}, {42, 127},
                                 {149, 66}, {149, 187}, {60, 187},  {60, 66}};
@@ -99,7 +99,8 @@ QString mismatch(const QVector<float>& actual, const QVector<float>& expected)
 
 // Stores a pointer list under a mixer section id, but to an object of the wrong class. It is
 // stored under a GUID that loads back as a real mixer list, which then meets that object.
-class Impostor : public RkElementData {
+class Impostor : public RkElementData
+{
     Q_OBJECT
 public:
     explicit Impostor(RkBase* target)
@@ -119,7 +120,8 @@ private:
 };
 
 // Saves an Impostor under its own GUID and makes a real mixer list from it on load.
-class ImpostorFactory : public RkClassFactory {
+class ImpostorFactory : public RkClassFactory
+{
 public:
     ImpostorFactory()
         : RkClassFactory(&Impostor::staticMetaObject,
@@ -131,7 +133,8 @@ public:
 
 } // namespace
 
-class TestRkEzMixer : public QObject {
+class TestRkEzMixer : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();

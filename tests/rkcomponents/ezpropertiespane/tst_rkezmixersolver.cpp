@@ -6,7 +6,8 @@
 
 #include <cmath>
 
-namespace {
+namespace
+{
 
 // Distinct scattered points on a mixer field of 210 by 254 pixels.
 QVector<QPoint> scatter(QRandomGenerator& random, int count)
@@ -27,7 +28,8 @@ QPoint anywhere(QRandomGenerator& random)
 
 } // namespace
 
-class TestRkEzMixerSolver : public QObject {
+class TestRkEzMixerSolver : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void twoControls_data();

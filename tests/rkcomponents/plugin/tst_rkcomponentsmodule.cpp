@@ -71,7 +71,8 @@ static QStringList exportedSymbols(const QString& path)
     return names;
 }
 
-class TestRkComponentsModule : public QObject {
+class TestRkComponentsModule : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -146,10 +147,11 @@ void TestRkComponentsModule::factoryTableOrder()
         ++row;
     }
     // The classes the module has so far; a class added to the module is added here too.
-    const QStringList built = {QStringLiteral("RkToolPane"),       QStringLiteral("RkToolPaneAction"),
-                               QStringLiteral("RkEzMixers"),       QStringLiteral("RkEzMixer"),
-                               QStringLiteral("RkEzMixerControl"), QStringLiteral("RkEzMixerDriver"),
-                               QStringLiteral("RkFullScreenAction")};
+    const QStringList built = {
+        QStringLiteral("RkToolPane"),        QStringLiteral("RkToolPaneAction"),
+        QStringLiteral("RkEzMixers"),        QStringLiteral("RkEzMixer"),
+        QStringLiteral("RkEzMixerControl"),  QStringLiteral("RkEzMixerDriver"),
+        QStringLiteral("RkFullScreenAction")};
     QCOMPARE(seen, built);
 }
 

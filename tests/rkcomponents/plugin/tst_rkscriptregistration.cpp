@@ -1,8 +1,8 @@
 #include "plugin/rkclassfactory.h"
-#include "rkcomponentsplugin.h"
-#include "rkfullscreenaction.h"
 #include "plugin/rkplugin.h"
 #include "plugin/rkpluginmgr.h"
+#include "rkcomponentsplugin.h"
+#include "rkfullscreenaction.h"
 #include "rktestmain.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
@@ -10,7 +10,8 @@
 #include <QPointer>
 #include <QScriptEngine>
 
-class TestRkScriptRegistration : public QObject {
+class TestRkScriptRegistration : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -76,7 +77,8 @@ void TestRkScriptRegistration::fullScreenFactory()
     RkClassFactory* factory = RkApp::findClassFactory(QStringLiteral("RkFullScreenAction"));
     QVERIFY(factory);
     QCOMPARE(factory->createInstanceFor(this), static_cast<QObject*>(nullptr));
-    std::unique_ptr<QObject> fromScript(factory->createInstance(static_cast<QScriptContext*>(nullptr)));
+    std::unique_ptr<QObject> fromScript(
+        factory->createInstance(static_cast<QScriptContext*>(nullptr)));
     QVERIFY(qobject_cast<RkFullScreenAction*>(fromScript.get()));
     std::unique_ptr<QObject> plain(factory->createInstance());
     QVERIFY(qobject_cast<RkFullScreenAction*>(plain.get()));

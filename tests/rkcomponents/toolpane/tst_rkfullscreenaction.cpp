@@ -1,7 +1,7 @@
 #include "actions/rkactionmgr.h"
+#include "plugin/rkpluginmgr.h"
 #include "rkcomponentsplugin.h"
 #include "rkfullscreenaction.h"
-#include "plugin/rkpluginmgr.h"
 #include "rktestmain.h"
 #include "viewport/rkviewport.h"
 
@@ -10,7 +10,8 @@
 #include <QScreen>
 #include <QToolBar>
 
-class TestRkFullScreenAction : public QObject {
+class TestRkFullScreenAction : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();

@@ -1,9 +1,9 @@
 #include "actions/rkaction.h"
 #include "actions/rkactionmenu.h"
 #include "actions/rkactionmgr.h"
-#include "rkcomponentsplugin.h"
 #include "panes/rkpanemgr.h"
 #include "plugin/rkpluginmgr.h"
+#include "rkcomponentsplugin.h"
 #include "rktestmain.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
@@ -17,22 +17,26 @@
 #include <QStackedWidget>
 #include <QToolBar>
 
-namespace {
+namespace
+{
 
-class FirstOption : public RkAction {
+class FirstOption : public RkAction
+{
     Q_OBJECT
 public:
     FirstOption() : RkAction(QStringLiteral("First Option"), QString()) {}
 };
 
-class SecondOption : public RkAction {
+class SecondOption : public RkAction
+{
     Q_OBJECT
 public:
     SecondOption() : RkAction(QStringLiteral("Second Option"), QString()) {}
 };
 
 // A tool with or without an options widget and an options menu; counts how often it is asked.
-class TestTool : public RkViewTool {
+class TestTool : public RkViewTool
+{
     Q_OBJECT
 public:
     TestTool(const QString& name, bool withWidget, const QStringList& menuEntries = {})
@@ -81,7 +85,8 @@ QStringList menuTexts(RkPane* pane)
 
 } // namespace
 
-class TestRkToolPane : public QObject {
+class TestRkToolPane : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -137,7 +142,8 @@ void TestRkToolPane::cleanup()
 
 RkToolPane* TestRkToolPane::pane() const
 {
-    return qobject_cast<RkToolPane*>(m_window->getPaneMgr()->findPane(QStringLiteral("RkToolPane")));
+    return qobject_cast<RkToolPane*>(
+        m_window->getPaneMgr()->findPane(QStringLiteral("RkToolPane")));
 }
 
 QLabel* TestRkToolPane::nameLabel() const

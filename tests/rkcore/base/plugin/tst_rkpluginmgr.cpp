@@ -8,12 +8,15 @@
 #include <QFile>
 #include <QTemporaryDir>
 
-namespace {
-class Dummy : public QObject {
+namespace
+{
+class Dummy : public QObject
+{
     Q_OBJECT
 };
 
-class DummyFactory : public RkClassFactory {
+class DummyFactory : public RkClassFactory
+{
 public:
     DummyFactory(const QString& guid)
         : RkClassFactory(&Dummy::staticMetaObject, RkGUID::fromString(guid))
@@ -25,7 +28,8 @@ public:
 };
 } // namespace
 
-class TestRkPluginMgr : public QObject {
+class TestRkPluginMgr : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void guidKeepsTextAndComparesByValue_data();
@@ -48,7 +52,8 @@ void TestRkPluginMgr::guidKeepsTextAndComparesByValue_data()
                             << "01EAF994-480E-49DB-92CB-12676A2BC3C7" << true << true;
     QTest::newRow("different") << "40e0b500-9711-11de-aed8-0002a5d5c51b"
                                << "55b5a760-9711-11de-b0b1-0002a5d5c51b" << true << false;
-    QTest::newRow("not a guid") << "Interface Components" << "" << false << true;
+    QTest::newRow("not a guid") << "Interface Components"
+                                << "" << false << true;
     QTest::newRow("one digit short") << "40e0b500-9711-11de-aed8-0002a5d5c51"
                                      << "" << false << true;
 }
@@ -82,8 +87,8 @@ void TestRkPluginMgr::registration()
     QVERIFY(mgr.addPlugin(&plugin));
     QCOMPARE(first.registered, 1);
     QCOMPARE(mgr.findClassFactory(QStringLiteral("Dummy")), &first);
-    QCOMPARE(mgr.findClassFactory(RkGUID::fromString(
-                 QStringLiteral("11111111-2222-3333-4444-555555555555"))),
+    QCOMPARE(mgr.findClassFactory(
+                 RkGUID::fromString(QStringLiteral("11111111-2222-3333-4444-555555555555"))),
              &first);
     QCOMPARE(mgr.findClassFactory(RkGUID()), static_cast<RkClassFactory*>(nullptr));
     QVERIFY(!mgr.addPlugin(&plugin));

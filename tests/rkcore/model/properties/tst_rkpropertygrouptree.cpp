@@ -1,9 +1,9 @@
-#include "scene/rkelement.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkintproperty.h"
 #include "properties/rkpropertygroup.h"
 #include "properties/rkpropertygrouptree.h"
 #include "rktestmain.h"
+#include "scene/rkelement.h"
 
 #include <QSignalSpy>
 

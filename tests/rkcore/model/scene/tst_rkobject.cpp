@@ -1,13 +1,13 @@
-#include "scene/rkbone.h"
 #include "demo/rkdemoscene.h"
+#include "geometry/rkpolymesh.h"
 #include "properties/rkfloatproperty.h"
+#include "rktestmain.h"
+#include "scene/rkbone.h"
 #include "scene/rkmaterial.h"
 #include "scene/rkobject.h"
-#include "geometry/rkpolymesh.h"
 #include "scene/rkscene.h"
 #include "scene/rkshape.h"
 #include "scene/rkskeleton.h"
-#include "rktestmain.h"
 
 #include <QPointer>
 #include <QSignalSpy>

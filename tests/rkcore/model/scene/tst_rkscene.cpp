@@ -1,12 +1,12 @@
-#include "scene/rkbone.h"
-#include "properties/rkboolproperty.h"
 #include "demo/rkdemoscene.h"
+#include "properties/rkboolproperty.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkpropertygroup.h"
 #include "properties/rkpropertygrouptree.h"
+#include "rktestmain.h"
+#include "scene/rkbone.h"
 #include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
-#include "rktestmain.h"
 
 #include <QSignalSpy>
 

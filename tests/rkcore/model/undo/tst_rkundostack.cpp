@@ -1,9 +1,9 @@
 #include "app/rkapp.h"
-#include "scene/rkcamera.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkintproperty.h"
-#include "scene/rkscene.h"
 #include "rktestmain.h"
+#include "scene/rkcamera.h"
+#include "scene/rkscene.h"
 #include "undo/rkundostack.h"
 #include "undo/rkundostackhold.h"
 

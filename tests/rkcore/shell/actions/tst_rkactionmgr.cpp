@@ -1,8 +1,8 @@
 #include "actions/rkaction.h"
 #include "actions/rkactionmenu.h"
 #include "actions/rkactionmgr.h"
-#include "plugin/rkclassfactory.h"
 #include "actions/rkhelpmgr.h"
+#include "plugin/rkclassfactory.h"
 #include "plugin/rkplugin.h"
 #include "plugin/rkpluginmgr.h"
 #include "rktestfactory.h"
@@ -12,9 +12,11 @@
 #include <QMenuBar>
 #include <QToolBar>
 
-namespace {
+namespace
+{
 
-class CountingAction : public RkAction {
+class CountingAction : public RkAction
+{
     Q_OBJECT
 public:
     CountingAction() : RkAction(QStringLiteral("&Count"), QStringLiteral("Counts triggers")) {}
@@ -29,7 +31,8 @@ public:
     QList<bool> toggles;
 };
 
-class AlphaAction : public RkAction {
+class AlphaAction : public RkAction
+{
     Q_OBJECT
 public:
     AlphaAction() : RkAction(QStringLiteral("Zeta"), QString()) {}
@@ -37,7 +40,8 @@ public:
     QString getDefaultMenuPath() const override { return QStringLiteral("Tools"); }
 };
 
-class BetaAction : public RkAction {
+class BetaAction : public RkAction
+{
     Q_OBJECT
 public:
     BetaAction() : RkAction(QStringLiteral("Alpha"), QString()) {}
@@ -46,7 +50,8 @@ public:
 };
 
 // A registered class that is no action.
-class NotAnAction : public QObject {
+class NotAnAction : public QObject
+{
     Q_OBJECT
 };
 
@@ -72,7 +77,8 @@ QStringList texts(const QMenu* menu)
 
 } // namespace
 
-class TestRkActionMgr : public QObject {
+class TestRkActionMgr : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -130,7 +136,7 @@ void TestRkActionMgr::buildMenu()
     menu.insertSeparator(); // leading: dropped
     menu.insertAction(QStringLiteral("CountingAction"));
     menu.insertSeparator();
-    menu.insertSeparator(); // doubled: one
+    menu.insertSeparator();                            // doubled: one
     menu.insertAction(QStringLiteral("NoSuchAction")); // unknown: skipped
     auto* sub = new RkActionMenu;
     sub->insertAction(QStringLiteral("AlphaAction"));
@@ -215,8 +221,8 @@ void TestRkActionMgr::onlineHelp()
     QCOMPARE(action.statusTip(), QStringLiteral("Changed"));
 
     QWidget button;
-    rkApp->getHelpMgr()->setOnlineHelp(&button, QStringLiteral("Refresh"), QStringLiteral("Refresh"),
-                                       QString(), QString());
+    rkApp->getHelpMgr()->setOnlineHelp(&button, QStringLiteral("Refresh"),
+                                       QStringLiteral("Refresh"), QString(), QString());
     QCOMPARE(button.toolTip(), QStringLiteral("Refresh"));
     QCOMPARE(button.statusTip(), QStringLiteral("Refresh"));
     QVERIFY(rkApp->getHelpMgr()->hasOnlineHelp(&button));

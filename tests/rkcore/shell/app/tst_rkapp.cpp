@@ -1,6 +1,6 @@
 #include "app/rkapp.h"
-#include "scene/rkscene.h"
 #include "rktestmain.h"
+#include "scene/rkscene.h"
 #include "undo/rkundostack.h"
 
 #include <QPointer>

@@ -4,7 +4,8 @@
 #include <QImage>
 #include <QPushButton>
 
-class TestRkStyle : public QObject {
+class TestRkStyle : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void installedApplicationWide();

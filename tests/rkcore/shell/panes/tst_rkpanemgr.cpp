@@ -1,11 +1,11 @@
 #include "actions/rkaction.h"
 #include "actions/rkactionmenu.h"
 #include "actions/rkactionmgr.h"
-#include "plugin/rkclassfactory.h"
 #include "panes/rkpane.h"
 #include "panes/rkpaneaction.h"
 #include "panes/rkpanemgr.h"
 #include "panes/rkpanesettings.h"
+#include "plugin/rkclassfactory.h"
 #include "plugin/rkplugin.h"
 #include "plugin/rkpluginmgr.h"
 #include "rktestfactory.h"
@@ -19,16 +19,19 @@
 #include <QTimer>
 #include <QToolButton>
 
-namespace {
+namespace
+{
 
-class ListPaneOption : public RkAction {
+class ListPaneOption : public RkAction
+{
     Q_OBJECT
 public:
     ListPaneOption() : RkAction(QStringLiteral("Compact Rows"), QString()) {}
 };
 
 // A pane with one stored switch and an options menu that depends on it.
-class ListPane : public RkPane {
+class ListPane : public RkPane
+{
     Q_OBJECT
 public:
     ListPane() : RkPane(QStringLiteral("List")) {}
@@ -55,13 +58,15 @@ public:
     int refreshes = 0;
 };
 
-class OtherPane : public RkPane {
+class OtherPane : public RkPane
+{
     Q_OBJECT
 public:
     OtherPane() : RkPane(QStringLiteral("Other")) {}
 };
 
-class ListPaneAction : public RkPaneAction {
+class ListPaneAction : public RkPaneAction
+{
     Q_OBJECT
 public:
     ListPaneAction() : RkPaneAction(QStringLiteral("ListPane")) {}
@@ -99,7 +104,8 @@ QStringList optionsShown(QDockWidget* dock)
 
 } // namespace
 
-class TestRkPaneMgr : public QObject {
+class TestRkPaneMgr : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
@@ -216,8 +222,8 @@ void TestRkPaneMgr::settingsLastBetweenRuns()
     {
         auto window = rkMakeTestMainWindow();
         window->getPaneMgr()->setSettingsFile(file);
-        auto* list = qobject_cast<ListPane*>(
-            window->getPaneMgr()->createPane(QStringLiteral("ListPane")));
+        auto* list =
+            qobject_cast<ListPane*>(window->getPaneMgr()->createPane(QStringLiteral("ListPane")));
         QVERIFY(!list->compact);
         list->compact = true;
     } // the window goes: settings are written
@@ -227,14 +233,15 @@ void TestRkPaneMgr::settingsLastBetweenRuns()
     {
         auto window = rkMakeTestMainWindow();
         window->getPaneMgr()->setSettingsFile(file);
-        auto* list = qobject_cast<ListPane*>(
-            window->getPaneMgr()->createPane(QStringLiteral("ListPane")));
+        auto* list =
+            qobject_cast<ListPane*>(window->getPaneMgr()->createPane(QStringLiteral("ListPane")));
         QVERIFY(list->compact);
     }
 
     // The default store lives under the test's private configuration folder, never the user's.
     QSettings(QSettings::IniFormat, QSettings::UserScope, QStringLiteral("rkhost"),
-              QStringLiteral("panes")).clear();
+              QStringLiteral("panes"))
+        .clear();
     {
         auto window = rkMakeTestMainWindow();
         window->getPaneMgr()->createPane(QStringLiteral("ListPane"));

@@ -9,7 +9,8 @@
 #include <QPointer>
 #include <QToolBar>
 
-class TestRkViewport : public QObject {
+class TestRkViewport : public QObject
+{
     Q_OBJECT
 private Q_SLOTS:
     void viewTakesThePlaceOfThePicture();
