@@ -31,11 +31,9 @@ float distance(const QPoint& a, const QPoint& b)
     return std::sqrt(dx * dx + dy * dy);
 }
 
-// Gaussian elimination with scaled partial pivoting, in place on a row-major n by n matrix. Each
-// row's scale is its largest absolute entry; the pivot row is the one with the largest entry
-// relative to its scale. Rows are not moved: index records their order. The multipliers are kept
-// where the eliminated entries were, for solve(). Returns false for a singular matrix.
-bool decompose(double* a, int n, int* index, double* scale)
+} // namespace
+
+bool RkEzMixerSolver::decompose(double* a, int n, int* index, double* scale)
 {
     for (int i = 0; i < n; ++i) {
         index[i] = i;
@@ -75,8 +73,7 @@ bool decompose(double* a, int n, int* index, double* scale)
     return true;
 }
 
-// Solves with a matrix that decompose() has worked on. b is used up; x receives the solution.
-void solve(const double* a, int n, const int* index, double* b, double* x)
+void RkEzMixerSolver::solve(const double* a, int n, const int* index, double* b, double* x)
 {
     for (int k = 0; k < n - 1; ++k) {
         const double bk = b[index[k]];
@@ -93,8 +90,6 @@ void solve(const double* a, int n, const int* index, double* b, double* x)
         x[i] = s / row[i];
     }
 }
-
-} // namespace
 
 RkEzMixerSolver::RkEzMixerSolver() = default;
 

@@ -43,6 +43,15 @@ public:
     // direction from the first point to the second).
     static Layout classify(const QVector<QPoint>& points);
 
+    // Gaussian elimination with scaled partial pivoting, in place on a row-major n by n matrix.
+    // Each row's scale is its largest absolute entry; the pivot row is the one with the largest
+    // entry relative to its scale. Rows are not moved: index records their order. The multipliers
+    // are kept where the eliminated entries were, for solve(). Returns false for a singular matrix
+    // (a pivot at or below 1e-12 of its row's scale, or a row that is zero or not finite).
+    static bool decompose(double* a, int n, int* index, double* scale);
+    // Solves with a matrix that decompose() has worked on. b is used up; x receives the solution.
+    static void solve(const double* a, int n, const int* index, double* b, double* x);
+
 private:
     void evaluateBasis(const QPoint& driver, std::vector<double>& phi) const;
 
