@@ -1,3 +1,5 @@
+#include "app/rkapp.h"
+#include "plugin/rkclassfactory.h"
 #include "properties/rkboolproperty.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkintproperty.h"
@@ -85,6 +87,8 @@ private Q_SLOTS:
     void boolWidgetTogglesAll();
     void intWidgetKeepsLimits();
     void optionsDialogValidatesAndAppliesOnce();
+    void factoriesMakeTheWidgets_data();
+    void factoriesMakeTheWidgets();
 
 private:
     std::unique_ptr<Parent> window;
@@ -324,6 +328,24 @@ void TestRkPropertyWgt::optionsDialogValidatesAndAppliesOnce()
     QCOMPARE(props[0]->getLabel(), QStringLiteral("Bend More"));
     QCOMPARE(props[0]->getMin(), 0.0f);
     QCOMPARE(rkUndoStack->count(), 1);
+}
+
+void TestRkPropertyWgt::factoriesMakeTheWidgets_data()
+{
+    QTest::addColumn<QString>("className");
+    QTest::newRow("float") << RkFloatProperty(QString(), QString()).widgetClassName();
+    QTest::newRow("int") << RkIntProperty(QString(), QString()).widgetClassName();
+    QTest::newRow("bool") << RkBoolProperty(QString(), QString()).widgetClassName();
+}
+
+void TestRkPropertyWgt::factoriesMakeTheWidgets()
+{
+    QFETCH(QString, className);
+    RkClassFactory* factory = RkApp::findClassFactory(className);
+    QVERIFY2(factory, qPrintable(className));
+    std::unique_ptr<QObject> made(factory->createInstance());
+    QVERIFY(qobject_cast<RkBasicPropertyWgt*>(made.get()));
+    QCOMPARE(QString::fromLatin1(made->metaObject()->className()), className);
 }
 
 RK_TEST_MAIN(TestRkPropertyWgt)
