@@ -34,8 +34,8 @@ void RkPropertyWgt::removeAllProperties()
         if (property)
             disconnect(property, nullptr, this, nullptr);
     }
+    // No update: the widget is emptied to be filled again (a pool does both at once) or hidden.
     d->properties.clear();
-    updateFromProperties();
 }
 
 void RkPropertyWgt::setSelected(bool selected)
@@ -87,10 +87,7 @@ void RkPropertyWgt::paintEvent(QPaintEvent*)
                                        QPalette::Highlight));
 }
 
-void RkPropertyWgt::updateFromProperties()
-{
-    update();
-}
+void RkPropertyWgt::updateFromProperties() {}
 
 bool RkPropertyWgt::isPropertyEditable(const RkProperty* property) const
 {

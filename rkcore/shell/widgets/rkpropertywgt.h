@@ -23,6 +23,8 @@ public:
     ~RkPropertyWgt() override;
 
     virtual void addProperty(RkProperty* property);
+    // Empties the widget for reuse. It keeps its look until it gets a property again (a pool
+    // refills or hides it at once); edits made meanwhile go nowhere.
     virtual void removeAllProperties();
     // A selected widget is drawn in the palette's highlight.
     virtual void setSelected(bool selected);
@@ -36,8 +38,8 @@ protected:
     void mousePressEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
-    // Brings the widget up to date with its properties: called when one is added, removed or
-    // destroyed and when a property's value, label or flags change.
+    // Brings the widget up to date with its properties: called when one is added or destroyed
+    // and when a property's value, label or flags change.
     virtual void updateFromProperties();
 
     // Whether the user may change the property. Properties cannot be read-only or locked yet, so

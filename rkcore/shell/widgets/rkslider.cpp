@@ -2,6 +2,7 @@
 
 #include <QApplication>
 #include <QFocusEvent>
+#include <QHash>
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QMouseEvent>
@@ -52,6 +53,7 @@ struct RkSlider::Private {
     bool rectsValid = false;
     QRect sliderRect, textRect, editRect, labelRect;
     QSize minSize;
+    QHash<QString, int> textWidths; // in the current font
 
     int gesture = NoGesture;
     double startValue = 0.0; // the value when the gesture began, put back by a cancel
@@ -251,22 +253,40 @@ double RkSlider::minimumStep() const
 
 void RkSlider::updateRect()
 {
-    d->sliderRect = calcSliderRect();
-    d->textRect = calcTextRect();
-    d->editRect = calcEditRect();
-    d->labelRect = calcLabelRect();
-    d->minSize = calcMinSize();
-    d->rectsValid = true;
-    if (d->editor && d->gesture == TextEdit)
-        d->editor->setGeometry(d->editRect);
+    // The calc operations run when a rectangle is next needed, so setters that change the layout
+    // one after the other cost one computation.
+    d->rectsValid = false;
+    if (d->gesture == TextEdit)
+        ensureRects();
     updateGeometry();
     update();
 }
 
 void RkSlider::ensureRects()
 {
-    if (!d->rectsValid)
-        updateRect();
+    if (d->rectsValid)
+        return;
+    d->rectsValid = true;
+    d->sliderRect = calcSliderRect();
+    d->textRect = calcTextRect();
+    d->editRect = calcEditRect();
+    d->labelRect = calcLabelRect();
+    d->minSize = calcMinSize();
+    if (d->editor && d->gesture == TextEdit)
+        d->editor->setGeometry(d->editRect);
+}
+
+int RkSlider::textWidth(const QString& text)
+{
+    // Shaping text is the dearest part of a layout; labels and value texts come back often.
+    auto it = d->textWidths.constFind(text);
+    if (it != d->textWidths.constEnd())
+        return *it;
+    if (d->textWidths.size() >= 64)
+        d->textWidths.clear();
+    const int width = fontMetrics().horizontalAdvance(text);
+    d->textWidths.insert(text, width);
+    return width;
 }
 
 QSize RkSlider::sizeHint() const
@@ -290,9 +310,9 @@ QSize RkSlider::calcMinSize()
     const QFontMetrics fm = fontMetrics();
     int width = 0;
     if (showingLabel())
-        width += fm.horizontalAdvance(d->label) + m;
+        width += textWidth(d->label) + m;
     if (isTextVisible())
-        width += fm.horizontalAdvance(widestValueText());
+        width += textWidth(widestValueText());
     const bool topRow = showingLabel() || isTextVisible();
     const int height = (topRow ? fm.height() + m / 2 : 0) + t;
     return QSize(qMax(width, 3 * t), height);
@@ -313,7 +333,7 @@ QRect RkSlider::calcTextRect()
     if (!isTextVisible())
         return QRect();
     const QRect r = rect();
-    const int w = qMin(r.width(), fontMetrics().horizontalAdvance(widestValueText()));
+    const int w = qMin(r.width(), textWidth(widestValueText()));
     return QRect(r.right() - w + 1, r.top(), w, fontMetrics().height());
 }
 
@@ -330,7 +350,7 @@ QRect RkSlider::calcLabelRect()
     const int m = style()->pixelMetric(QStyle::PM_CustomBase);
     int w = r.width();
     if (isTextVisible())
-        w -= fontMetrics().horizontalAdvance(widestValueText()) + m;
+        w -= textWidth(widestValueText()) + m;
     return QRect(r.left(), r.top(), qMax(w, 0), fontMetrics().height());
 }
 
@@ -519,8 +539,8 @@ void RkSlider::changeEvent(QEvent* event)
         break;
     case QEvent::FontChange:
     case QEvent::StyleChange:
-        d->rectsValid = false;
-        updateGeometry();
+        d->textWidths.clear();
+        updateRect();
         break;
     default:
         break;

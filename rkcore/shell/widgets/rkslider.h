@@ -13,8 +13,8 @@
 // the value changes of a gesture come in between. Esc cancels a gesture and puts the value back.
 //
 // The layout comes from the calc operations alone: painting and hit-testing read only the
-// rectangles they return (cached; updateRect() and a resize recompute them), so a subclass lays
-// the slider out differently by overriding them.
+// rectangles they return (cached; updateRect() and a resize have them computed again), so a
+// subclass lays the slider out differently by overriding them.
 //
 // The base class does not know the value's type: RkFloatSlider and RkIntSlider give it one.
 class RKCORE_EXPORT RkSlider : public QWidget
@@ -58,7 +58,8 @@ public:
     // The value as the slider shows it.
     QString getValueText() const;
 
-    // Recomputes the cached rectangles and the minimum size from the calc operations.
+    // Has the cached rectangles and the minimum size computed again from the calc operations
+    // (when they are next needed).
     void updateRect();
 
     QSize sizeHint() const override;
@@ -117,6 +118,10 @@ protected:
     virtual QString widestValueText() const = 0;
     // The smallest step a key can make.
     virtual double minimumStep() const;
+
+    // The width of a text in the slider's font, remembered: for calc operations, which run on
+    // every layout change.
+    int textWidth(const QString& text);
 
 private:
     void ensureRects();
