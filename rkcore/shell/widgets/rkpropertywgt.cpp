@@ -72,10 +72,8 @@ QList<RkProperty*> RkPropertyWgt::getProperties() const
 
 void RkPropertyWgt::mousePressEvent(QMouseEvent* event)
 {
-    if (event->button() == Qt::RightButton)
-        event->ignore();
-    else
-        QWidget::mousePressEvent(event);
+    // Other presses stop here: the widget, not what lies under it, was clicked.
+    event->setAccepted(event->button() != Qt::RightButton);
 }
 
 void RkPropertyWgt::paintEvent(QPaintEvent*)
@@ -83,8 +81,10 @@ void RkPropertyWgt::paintEvent(QPaintEvent*)
     if (!d->selected)
         return;
     QPainter p(this);
-    p.fillRect(rect(), palette().color(isEnabled() ? QPalette::Active : QPalette::Disabled,
-                                       QPalette::Highlight));
+    const QPalette::ColorGroup group = !isEnabled()       ? QPalette::Disabled
+                                       : isActiveWindow() ? QPalette::Active
+                                                          : QPalette::Inactive;
+    p.fillRect(rect(), palette().color(group, QPalette::Highlight));
 }
 
 void RkPropertyWgt::updateFromProperties() {}

@@ -204,11 +204,14 @@ void TestRkPropertyWgt::rightPressReachesTheParent()
     QTest::mousePress(widget, Qt::RightButton, {}, QPoint(1, 1));
     QTest::mousePress(slider, Qt::LeftButton, {}, slider->calcSliderRect().center());
     QTest::mouseRelease(slider, Qt::LeftButton);
+    QTest::mousePress(widget, Qt::LeftButton, {}, QPoint(1, 1));
     QCOMPARE(window->presses, QList<Qt::MouseButton>({Qt::RightButton, Qt::RightButton}));
 }
 
 void TestRkPropertyWgt::selectionAndMouseOverBar()
 {
+    QCursor::setPos(window->geometry().bottomRight() + QPoint(100, 100)); // the pointer away
+    QApplication::processEvents();
     const QColor highlight = widget->palette().color(QPalette::Active, QPalette::Highlight);
     QVERIFY(widget->grab().toImage().pixelColor(1, 1) != highlight);
     widget->setSelected(true);
