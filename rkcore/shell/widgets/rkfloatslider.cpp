@@ -2,7 +2,14 @@
 
 #include <cmath>
 
-RkFloatSlider::RkFloatSlider(QWidget* parent, const QString& text) : RkSlider(parent, text) {}
+struct RkFloatSlider::Private {
+    bool percent = false;
+};
+
+RkFloatSlider::RkFloatSlider(QWidget* parent, const QString& text)
+    : RkSlider(parent, text), d(std::make_unique<Private>())
+{
+}
 
 RkFloatSlider::~RkFloatSlider() = default;
 
@@ -43,14 +50,14 @@ void RkFloatSlider::setDefaultValue(float value)
 
 bool RkFloatSlider::getDisplayAsPercent() const
 {
-    return m_percent;
+    return d->percent;
 }
 
 void RkFloatSlider::setDisplayAsPercent(bool on)
 {
-    if (on == m_percent)
+    if (on == d->percent)
         return;
-    m_percent = on;
+    d->percent = on;
     updateRect();
 }
 
@@ -62,7 +69,7 @@ double RkFloatSlider::roundValue(double value) const
 QString RkFloatSlider::formatValue(double value) const
 {
     // One decimal more than a fine (Shift) step of the default sensitivity needs.
-    if (m_percent)
+    if (d->percent)
         return QString::number(value * 100.0, 'f', 1) + QLatin1Char('%');
     return QString::number(value, 'f', 3);
 }
@@ -71,7 +78,7 @@ bool RkFloatSlider::parseValue(const QString& text, double* value) const
 {
     QString t = text.trimmed();
     // "50%" means a half whatever the display; plain numbers follow the display.
-    bool percent = m_percent;
+    bool percent = d->percent;
     if (t.endsWith(QLatin1Char('%'))) {
         t.chop(1);
         percent = true;
@@ -93,5 +100,5 @@ void RkFloatSlider::sliderValueChanged()
 
 QString RkFloatSlider::widestValueText() const
 {
-    return m_percent ? QStringLiteral("-000.0%") : QStringLiteral("-0000.000");
+    return d->percent ? QStringLiteral("-000.0%") : QStringLiteral("-0000.000");
 }

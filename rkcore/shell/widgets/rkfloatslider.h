@@ -37,5 +37,6 @@ protected:
     QString widestValueText() const override;
 
 private:
-    bool m_percent = false;
+    struct Private;
+    std::unique_ptr<Private> d;
 };
