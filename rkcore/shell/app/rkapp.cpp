@@ -6,6 +6,7 @@
 #include "scene/rkscene.h"
 #include "scene/rksceneclasses.h"
 #include "undo/rkundostack.h"
+#include "widgets/rkwidgetclasses.h"
 
 #include <QApplication>
 #include <QCoreApplication>
@@ -53,6 +54,8 @@ RkApp::RkApp(QObject* parent) : QObject(parent), d(std::make_unique<Private>())
                                           d->engine->newFunction(scriptPrint));
     d->pluginMgr = new RkPluginMgr(d->engine.get(), this);
     for (RkClassFactory* factory : rkSceneClassFactories())
+        d->pluginMgr->addClassFactory(factory);
+    for (RkClassFactory* factory : rkWidgetClassFactories())
         d->pluginMgr->addClassFactory(factory);
     rkSetLogHandler([this](const QString& line) { log(line); });
     d->helpMgr = new RkHelpMgr(this);

@@ -1,0 +1,77 @@
+#include "widgets/rkintpropertywgt.h"
+
+#include "properties/rkintproperty.h"
+#include "widgets/rkintslider.h"
+
+#include <QSignalBlocker>
+
+struct RkIntPropertyWgt::Private {
+    RkIntSlider* slider = nullptr;
+};
+
+RkIntPropertyWgt::RkIntPropertyWgt(QWidget* parent, const QString& name)
+    : RkBasicPropertyWgt(parent, name), d(std::make_unique<Private>())
+{
+    d->slider = new RkIntSlider(this, QStringLiteral("IntPropertySlider"));
+    attachSlider(d->slider);
+    connect(d->slider, &RkIntSlider::valueChanged, this, &RkIntPropertyWgt::sliderValueChanged);
+    updateFromProperties();
+}
+
+RkIntPropertyWgt::~RkIntPropertyWgt() = default;
+
+void RkIntPropertyWgt::addProperty(RkProperty* property)
+{
+    auto* intProperty = qobject_cast<RkIntProperty*>(property);
+    if (!intProperty || getProperties().contains(property))
+        return;
+    connect(intProperty, &RkNumericProperty::clampedChanged, this,
+            &RkIntPropertyWgt::propertyChanged);
+    connect(intProperty, &RkNumericProperty::minMaxChanged, this,
+            &RkIntPropertyWgt::propertyChanged);
+    RkBasicPropertyWgt::addProperty(property);
+}
+
+void RkIntPropertyWgt::setIsMouseOverSlider(bool on)
+{
+    setSliderBarOnHover(on);
+}
+
+bool RkIntPropertyWgt::isMouseOverSlider() const
+{
+    return isSliderBarOnHover();
+}
+
+void RkIntPropertyWgt::updateFromProperties()
+{
+    const auto* first = static_cast<const RkIntProperty*>(getFirstProperty());
+    const QSignalBlocker blocker(d->slider);
+    if (!first) {
+        d->slider->setLabel(QString());
+        d->slider->setMixed(false);
+        d->slider->setEnabled(false);
+        RkBasicPropertyWgt::updateFromProperties();
+        return;
+    }
+    d->slider->setLabel(first->getLabel());
+    d->slider->setClamped(first->isClamped());
+    d->slider->setMinMax(first->getMin(), first->getMax());
+    d->slider->setDefaultValue(first->getDefaultValue());
+    d->slider->setValue(first->getValue());
+    bool mixed = false;
+    for (const RkProperty* property : getProperties())
+        mixed =
+            mixed || static_cast<const RkIntProperty*>(property)->getValue() != first->getValue();
+    d->slider->setMixed(mixed);
+    d->slider->setEnabled(arePropertiesEditable());
+    RkBasicPropertyWgt::updateFromProperties();
+}
+
+void RkIntPropertyWgt::sliderValueChanged(int value)
+{
+    if (!isPropertyEditOpen())
+        return;
+    writeProperties([value](RkProperty* property) {
+        static_cast<RkIntProperty*>(property)->adjustValue(value);
+    });
+}
