@@ -9,6 +9,7 @@
 #include "rkaboutplugins.h"
 #include "rkdemotools.h"
 #include "rkhostactions.h"
+#include "rkpropertiesdock.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
 #include "rkscriptsurface.h"
@@ -268,6 +269,7 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&Window"));
     auto* sceneMenus = new RkSceneMenus(&window);
     rkAddSceneList(&window);
+    rkAddPropertiesDock(&window);
     rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
     rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());

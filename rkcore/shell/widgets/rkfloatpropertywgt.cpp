@@ -1,6 +1,8 @@
 #include "widgets/rkfloatpropertywgt.h"
 
 #include "properties/rkfloatproperty.h"
+#include "properties/rkpropertydefinitioncommand.h"
+#include "undo/rkundostack.h"
 #include "undo/rkundostackhold.h"
 #include "widgets/rkfloatslider.h"
 
@@ -206,6 +208,7 @@ bool RkFloatPropertyWgt::doOptionsDialog()
     RkUndoStackHold hold;
     writeProperties([&](RkProperty* property) {
         auto* p = static_cast<RkFloatProperty*>(property);
+        auto definition = std::make_unique<RkPropertyDefinitionCommand>(p);
         p->setLabel(label);
         p->setMinMax(dialog.minValue, dialog.maxValue);
         p->setClamped(clamped);
@@ -213,6 +216,9 @@ bool RkFloatPropertyWgt::doOptionsDialog()
         p->setDisplayAsPercent(dialog.percent->isChecked());
         p->setHidden(dialog.hidden->isChecked());
         // New limits hold for the value at once.
+        definition->afterChange();
+        if (rkUndoStack)
+            rkUndoStack->push(std::move(definition));
         if (clamped)
             p->adjustValue(p->getValue());
     });

@@ -91,7 +91,7 @@ void RkPropertyWgt::updateFromProperties() {}
 
 bool RkPropertyWgt::isPropertyEditable(const RkProperty* property) const
 {
-    return property != nullptr;
+    return property && !property->isLocked();
 }
 
 bool RkPropertyWgt::arePropertiesEditable() const

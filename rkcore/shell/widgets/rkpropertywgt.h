@@ -42,8 +42,8 @@ protected:
     // and when a property's value, label or flags change.
     virtual void updateFromProperties();
 
-    // Whether the user may change the property. Properties cannot be read-only or locked yet, so
-    // this answers true; the widgets already show a property that is not editable as disabled.
+    // Whether the user may change the property: not while it is locked. The widgets show a
+    // property that is not editable as disabled.
     bool isPropertyEditable(const RkProperty* property) const;
     // True when there is a property and every one is editable.
     bool arePropertiesEditable() const;

@@ -87,6 +87,7 @@ private Q_SLOTS:
     void boolWidgetTogglesAll();
     void intWidgetKeepsLimits();
     void optionsDialogValidatesAndAppliesOnce();
+    void lockedPropertyRefusesTheUser();
     void factoriesMakeTheWidgets_data();
     void factoriesMakeTheWidgets();
 
@@ -320,6 +321,18 @@ void TestRkPropertyWgt::optionsDialogValidatesAndAppliesOnce()
     QCOMPARE(slider->getValueText(), QStringLiteral("10.0%"));
     QCOMPARE(rkUndoStack->count(), 1);
     QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Bend More"));
+    // The one entry takes the definitions back with the clamped value, and brings them again.
+    rkUndoStack->undo();
+    for (RkFloatProperty* p : props) {
+        QCOMPARE(p->getLabel(), QStringLiteral("Bend"));
+        QVERIFY(!p->isClamped() && !p->getDisplayAsPercent() && !p->isHidden());
+        QCOMPARE(p->getSensitivity(), 0.01f);
+    }
+    QCOMPARE(props[2]->getValue(), 0.3f);
+    rkUndoStack->redo();
+    QCOMPARE(props[1]->getLabel(), QStringLiteral("Bend More"));
+    QCOMPARE(props[2]->getValue(), 0.25f);
+    QVERIFY(props[0]->isHidden() && props[0]->getMax() == 0.25f);
 
     // Cancel changes nothing, whatever the fields say.
     onDialog([](QDialog* dialog) {
@@ -331,6 +344,18 @@ void TestRkPropertyWgt::optionsDialogValidatesAndAppliesOnce()
     QCOMPARE(props[0]->getLabel(), QStringLiteral("Bend More"));
     QCOMPARE(props[0]->getMin(), 0.0f);
     QCOMPARE(rkUndoStack->count(), 1);
+}
+
+void TestRkPropertyWgt::lockedPropertyRefusesTheUser()
+{
+    props[1]->setLocked(true);
+    QVERIFY(!slider->isEnabled());
+    QVERIFY(!widget->doOptionsDialog());
+    QTest::keyClick(slider, Qt::Key_Right);
+    QCOMPARE(props[0]->getValue(), 0.1f);
+    QCOMPARE(rkUndoStack->count(), 0);
+    props[1]->setLocked(false);
+    QVERIFY(slider->isEnabled());
 }
 
 void TestRkPropertyWgt::factoriesMakeTheWidgets_data()
