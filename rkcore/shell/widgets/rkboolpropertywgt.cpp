@@ -40,10 +40,7 @@ void RkBoolPropertyWgt::setSelected(bool selected)
 void RkBoolPropertyWgt::updateFromProperties()
 {
     const auto* first = static_cast<const RkBoolProperty*>(getFirstProperty());
-    bool mixed = false;
-    for (const RkProperty* property : getProperties())
-        mixed =
-            mixed || static_cast<const RkBoolProperty*>(property)->getValue() != first->getValue();
+    const bool mixed = arePropertiesMixed();
     d->box->setText(first ? first->getLabel() : QString());
     d->box->setTristate(mixed);
     d->box->setCheckState(mixed                        ? Qt::PartiallyChecked

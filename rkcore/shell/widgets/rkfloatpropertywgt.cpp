@@ -176,11 +176,7 @@ void RkFloatPropertyWgt::updateFromProperties()
     d->slider->setDefaultValue(first->getDefaultValue());
     d->slider->setDisplayAsPercent(first->getDisplayAsPercent());
     d->slider->setValue(first->getValue());
-    bool mixed = false;
-    for (const RkProperty* property : getProperties())
-        mixed =
-            mixed || static_cast<const RkFloatProperty*>(property)->getValue() != first->getValue();
-    d->slider->setMixed(mixed);
+    d->slider->setMixed(arePropertiesMixed());
     d->slider->setEnabled(arePropertiesEditable());
     RkBasicPropertyWgt::updateFromProperties();
 }

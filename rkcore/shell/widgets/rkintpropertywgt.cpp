@@ -58,11 +58,7 @@ void RkIntPropertyWgt::updateFromProperties()
     d->slider->setMinMax(first->getMin(), first->getMax());
     d->slider->setDefaultValue(first->getDefaultValue());
     d->slider->setValue(first->getValue());
-    bool mixed = false;
-    for (const RkProperty* property : getProperties())
-        mixed =
-            mixed || static_cast<const RkIntProperty*>(property)->getValue() != first->getValue();
-    d->slider->setMixed(mixed);
+    d->slider->setMixed(arePropertiesMixed());
     d->slider->setEnabled(arePropertiesEditable());
     RkBasicPropertyWgt::updateFromProperties();
 }

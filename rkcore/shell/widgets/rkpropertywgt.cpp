@@ -106,6 +106,16 @@ bool RkPropertyWgt::arePropertiesEditable() const
     return true;
 }
 
+bool RkPropertyWgt::arePropertiesMixed() const
+{
+    const QList<RkProperty*> properties = getProperties();
+    for (const RkProperty* property : properties) {
+        if (property->getValueVariant() != properties.first()->getValueVariant())
+            return true;
+    }
+    return false;
+}
+
 void RkPropertyWgt::writeProperties(const std::function<void(RkProperty*)>& write)
 {
     d->writing = true;

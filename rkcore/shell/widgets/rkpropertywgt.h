@@ -47,6 +47,8 @@ protected:
     bool isPropertyEditable(const RkProperty* property) const;
     // True when there is a property and every one is editable.
     bool arePropertiesEditable() const;
+    // True when the properties do not all hold the same value (the widget shows them mixed).
+    bool arePropertiesMixed() const;
 
     // Runs the write on every property, then updates the widget once.
     void writeProperties(const std::function<void(RkProperty*)>& write);
