@@ -15,24 +15,14 @@
 namespace
 {
 
-const int kPathRole = Qt::UserRole + 1;
-
 // Every group of the tree as an item carrying its path, as the Shape tab fills its chooser.
 void addGroups(RkPropertyGroup* group, QStandardItem* parent)
 {
     for (; group; group = group->getNextSibling()) {
         auto* item = new QStandardItem(group->getName());
-        item->setData(group->getPath(), kPathRole);
         parent->appendRow(item);
         addGroups(group->getFirstChild(), item);
     }
-}
-
-QStandardItem* itemAt(QStandardItemModel& model, const QString& path)
-{
-    const QModelIndexList found =
-        model.match(model.index(0, 0), kPathRole, path, 1, Qt::MatchExactly | Qt::MatchRecursive);
-    return found.isEmpty() ? nullptr : model.itemFromIndex(found.first());
 }
 
 // The combo boxes on screen, top to bottom.
@@ -99,6 +89,9 @@ void TestRkDropDownView::choosingByMouse()
     tree.addProperty(&belly, "Morphs/Body");
     QStandardItemModel model;
     addGroups(tree.getFirstChild(), model.invisibleRootItem());
+    const QModelIndex morphs = model.index(1, 0);
+    const QModelIndex face = model.index(0, 0, model.index(0, 0, morphs));
+    const QModelIndex body = model.index(1, 0, morphs);
 
     RkDropDownView view;
     QSignalSpy spy(&view, &QAbstractItemView::activated);
@@ -119,26 +112,26 @@ void TestRkDropDownView::choosingByMouse()
     QCOMPARE(view.height(), row);
 
     QVERIFY(choose(combos[0], "Morphs"));
-    QCOMPARE(lastActivated(spy), itemAt(model, "Morphs")->index());
+    QCOMPARE(lastActivated(spy), morphs);
     combos = visibleCombos(view);
     QCOMPARE(combos.size(), 2);
     QCOMPARE(entries(combos[1]), (QStringList{"Make Selection", "Head", "Body"}));
     QVERIFY(choose(combos[1], "Head"));
     QVERIFY(choose(visibleCombos(view).value(2), "Face"));
     // A leaf adds no box on screen.
-    QCOMPARE(lastActivated(spy), itemAt(model, "Morphs/Head/Face")->index());
+    QCOMPARE(lastActivated(spy), face);
     QCOMPARE(visibleCombos(view).size(), 3);
     QCOMPARE(view.height(), 3 * row);
 
     // Another choice higher up replaces everything below it.
     QVERIFY(choose(visibleCombos(view).value(1), "Body"));
-    QCOMPARE(lastActivated(spy), itemAt(model, "Morphs/Body")->index());
+    QCOMPARE(lastActivated(spy), body);
     QCOMPARE(visibleCombos(view).size(), 2);
     QCOMPARE(view.height(), 2 * row);
 
     // "Make Selection" steps back to the choice one level up.
     QVERIFY(choose(visibleCombos(view).value(1), "Make Selection"));
-    QCOMPARE(lastActivated(spy), itemAt(model, "Morphs")->index());
+    QCOMPARE(lastActivated(spy), morphs);
     QCOMPARE(visibleCombos(view).size(), 2);
     QVERIFY(choose(visibleCombos(view).value(0), "Make Selection"));
     QVERIFY(!lastActivated(spy).isValid());
