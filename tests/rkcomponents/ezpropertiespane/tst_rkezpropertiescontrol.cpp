@@ -1,0 +1,278 @@
+#include "properties/rkfloatproperty.h"
+#include "rkezpropertiescontrol.h"
+#include "rktestmain.h"
+#include "scene/rknode.h"
+#include "scene/rkscene.h"
+#include "undo/rkundostack.h"
+#include "undo/rkundostackhold.h"
+#include "widgets/rkfloatslider.h"
+
+#include <QFrame>
+#include <QLabel>
+#include <QPointer>
+
+namespace
+{
+
+void sendMove(QWidget* w, QPoint to)
+{
+    QMouseEvent move(QEvent::MouseMove, to, w->mapToGlobal(to), Qt::NoButton, Qt::LeftButton,
+                     Qt::NoModifier);
+    QApplication::sendEvent(w, &move);
+}
+
+// Presses on the slider's bar and drags right; the caller releases (or not).
+void startDrag(RkFloatSlider* slider)
+{
+    const QPoint from = slider->rect().center();
+    QTest::mousePress(slider, Qt::LeftButton, {}, from);
+    sendMove(slider, from + QPoint(10, 0));
+    sendMove(slider, from + QPoint(20, 0));
+}
+
+} // namespace
+
+class TestRkEzPropertiesControl : public QObject
+{
+    Q_OBJECT
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void sliderGestureIsOneUndoEntry_data();
+    void sliderGestureIsOneUndoEntry();
+    void hoverPreview_data();
+    void hoverPreview();
+    void deletedPropertyStopsEverything_data();
+    void deletedPropertyStopsEverything();
+    void destroyedMidGestureFreesTheStack_data();
+    void destroyedMidGestureFreesTheStack();
+
+private:
+    // The tile in a shown window with the pointer away from it.
+    void makeTile(RkFloatProperty* property);
+    QFrame* imageFrame() const;
+    QFrame* labelFrame() const;
+    QLabel* valueLabel() const;
+    QLabel* nameLabel() const;
+
+    std::unique_ptr<QWidget> m_window;
+    QPointer<RkEzPropertiesControl> m_tile;
+    std::unique_ptr<RkFloatProperty> m_property;
+};
+
+void TestRkEzPropertiesControl::init()
+{
+    rkUndoStack->clear();
+    rkScene->setPlaying(false);
+    m_property =
+        std::make_unique<RkFloatProperty>(QStringLiteral("smile"), QStringLiteral("Smile"));
+    m_property->setMinMax(-1.f, 1.f);
+    m_property->setClamped(true);
+}
+
+void TestRkEzPropertiesControl::cleanup()
+{
+    m_window.reset();
+    m_property.reset();
+    QCursor::setPos(0, 0);
+}
+
+void TestRkEzPropertiesControl::makeTile(RkFloatProperty* property)
+{
+    m_window = std::make_unique<QWidget>();
+    m_window->setGeometry(200, 200, 300, 300);
+    m_tile = new RkEzPropertiesControl(property, m_window.get(), nullptr);
+    m_tile->setGeometry(100, 50, 100, 130);
+    m_window->show();
+    QVERIFY(QTest::qWaitForWindowExposed(m_window.get()));
+    QTest::mouseMove(m_window.get(), QPoint(5, 5));
+}
+
+QFrame* TestRkEzPropertiesControl::imageFrame() const
+{
+    return m_tile->findChildren<QFrame*>(QString(), Qt::FindDirectChildrenOnly).value(0);
+}
+
+QFrame* TestRkEzPropertiesControl::labelFrame() const
+{
+    return m_tile->findChildren<QFrame*>(QString(), Qt::FindDirectChildrenOnly).value(1);
+}
+
+QLabel* TestRkEzPropertiesControl::valueLabel() const
+{
+    return imageFrame()->findChild<QLabel*>();
+}
+
+QLabel* TestRkEzPropertiesControl::nameLabel() const
+{
+    return labelFrame()->findChild<QLabel*>();
+}
+
+void TestRkEzPropertiesControl::sliderGestureIsOneUndoEntry_data()
+{
+    QTest::addColumn<QString>("label");
+    QTest::addColumn<bool>("cancel");
+    QTest::addColumn<QString>("caption");
+    QTest::newRow("drag") << "Smile" << false << "Smile";
+    QTest::newRow("unnamed") << "" << false << "Unnamed";
+    QTest::newRow("escape") << "Smile" << true << "";
+}
+
+void TestRkEzPropertiesControl::sliderGestureIsOneUndoEntry()
+{
+    QFETCH(QString, label);
+    QFETCH(bool, cancel);
+    QFETCH(QString, caption);
+    m_property->setLabel(label);
+    m_property->setValue(0.1f);
+    makeTile(m_property.get());
+    QCOMPARE(valueLabel()->text(), QStringLiteral("10%"));
+
+    RkFloatSlider* slider = m_tile->getSlider();
+    QVERIFY(!slider->isVisible());
+    QTest::mouseMove(nameLabel());
+    QTRY_VERIFY(slider->isVisible());
+    QCOMPARE(slider->size(), nameLabel()->size());
+
+    startDrag(slider);
+    QVERIFY(m_property->getValue() > 0.25f);
+    QCOMPARE(valueLabel()->text(), QStringLiteral("%1%").arg(int(m_property->getValue() * 100)));
+    if (cancel)
+        QTest::keyClick(slider, Qt::Key_Escape);
+    QTest::mouseRelease(slider, Qt::LeftButton, {}, slider->rect().center() + QPoint(20, 0));
+
+    QVERIFY(!rkUndoStack->canPushItems());
+    QVERIFY(!m_property->isEditing());
+    QCOMPARE(rkUndoStack->count(), cancel ? 0 : 1);
+    if (cancel) {
+        QCOMPARE(m_property->getValue(), 0.1f);
+        return;
+    }
+    QCOMPARE(rkUndoStack->getUndoCaption(), caption);
+    rkUndoStack->undo();
+    QCOMPARE(m_property->getValue(), 0.1f);
+    QCOMPARE(valueLabel()->text(), QStringLiteral("10%"));
+}
+
+void TestRkEzPropertiesControl::hoverPreview_data()
+{
+    QTest::addColumn<float>("value");
+    QTest::addColumn<bool>("playing");
+    QTest::addColumn<bool>("otherHold");
+    QTest::addColumn<bool>("previews");
+    QTest::newRow("0.3") << 0.3f << false << false << true;
+    QTest::newRow("-0.257") << -0.257f << false << false << true;
+    QTest::newRow("half") << 0.5f << false << false << false;
+    QTest::newRow("-0.7") << -0.7f << false << false << false;
+    QTest::newRow("playing") << 0.3f << true << false << false;
+    QTest::newRow("other edit open") << 0.3f << false << true << false;
+}
+
+void TestRkEzPropertiesControl::hoverPreview()
+{
+    QFETCH(float, value);
+    QFETCH(bool, playing);
+    QFETCH(bool, otherHold);
+    QFETCH(bool, previews);
+    m_property->setValue(value);
+    makeTile(m_property.get());
+    const QString text = valueLabel()->text();
+    rkScene->setPlaying(playing);
+    auto other = otherHold ? std::make_unique<RkUndoStackHold>() : nullptr;
+
+    QTest::mouseMove(imageFrame());
+    QTRY_COMPARE(m_tile->isPointerOverImage(), true);
+    QCOMPARE(m_tile->isPreviewing(), previews);
+    QCOMPARE(m_property->getValue(), previews ? 1.f : value);
+    QCOMPARE(valueLabel()->text(), previews ? QStringLiteral("100%") : text);
+
+    QTest::mouseMove(m_window.get(), QPoint(5, 5));
+    QTRY_COMPARE(m_tile->isPointerOverImage(), false);
+    other.reset();
+    QVERIFY(!m_tile->isPreviewing());
+    QCOMPARE(m_property->getValue(), value);
+    QCOMPARE(valueLabel()->text(), text);
+    QCOMPARE(rkUndoStack->count(), 0);
+    QVERIFY(!rkUndoStack->canPushItems());
+}
+
+void TestRkEzPropertiesControl::deletedPropertyStopsEverything_data()
+{
+    QTest::addColumn<bool>("editing");
+    QTest::newRow("hovered") << false;
+    QTest::newRow("slider drag") << true;
+}
+
+void TestRkEzPropertiesControl::deletedPropertyStopsEverything()
+{
+    QFETCH(bool, editing);
+    auto* node = new RkNode;
+    rkScene->addNode(node);
+    auto* property = new RkFloatProperty(QStringLiteral("blink"), QStringLiteral("Blink"));
+    property->setValue(0.2f);
+    node->addProperty(property, QStringLiteral("Morphs"));
+    makeTile(property);
+    RkFloatSlider* slider = m_tile->getSlider();
+    if (editing) {
+        QTest::mouseMove(nameLabel());
+        QTRY_VERIFY(slider->isVisible());
+        startDrag(slider);
+    } else {
+        QTest::mouseMove(imageFrame());
+        QTRY_VERIFY(m_tile->isPreviewing());
+    }
+    QVERIFY(rkUndoStack->canPushItems());
+
+    rkScene->removeNode(node);
+    QVERIFY(!m_tile->getProperty());
+    QVERIFY(!rkUndoStack->canPushItems());
+    QVERIFY(!m_tile->isPreviewing());
+    QVERIFY(!slider->isVisible());
+    QVERIFY(nameLabel()->text().isEmpty());
+    QVERIFY(valueLabel()->text().isEmpty());
+
+    // What the user does next reaches nothing.
+    sendMove(slider, slider->rect().center() + QPoint(40, 0));
+    QTest::mouseRelease(slider, Qt::LeftButton, {}, slider->rect().center());
+    QTest::mouseMove(nameLabel());
+    QTest::mouseMove(imageFrame());
+    QTest::mouseMove(m_window.get(), QPoint(5, 5));
+    QVERIFY(!rkUndoStack->canPushItems());
+    QCOMPARE(rkUndoStack->count(), 0);
+}
+
+void TestRkEzPropertiesControl::destroyedMidGestureFreesTheStack_data()
+{
+    QTest::addColumn<bool>("editing");
+    QTest::newRow("hover preview") << false;
+    QTest::newRow("slider drag") << true;
+}
+
+void TestRkEzPropertiesControl::destroyedMidGestureFreesTheStack()
+{
+    QFETCH(bool, editing);
+    m_property->setValue(0.1f);
+    makeTile(m_property.get());
+    if (editing) {
+        QTest::mouseMove(nameLabel());
+        QTRY_VERIFY(m_tile->getSlider()->isVisible());
+        startDrag(m_tile->getSlider());
+    } else {
+        QTest::mouseMove(imageFrame());
+        QTRY_VERIFY(m_tile->isPreviewing());
+    }
+    const float during = m_property->getValue();
+    QVERIFY(during != 0.1f);
+
+    delete m_tile;
+    QVERIFY(!rkUndoStack->canPushItems());
+    QVERIFY(!m_property->isEditing());
+    // A drag keeps what it did as one entry; a preview goes back and leaves none.
+    QCOMPARE(rkUndoStack->count(), editing ? 1 : 0);
+    QCOMPARE(m_property->getValue(), editing ? during : 0.1f);
+    if (editing)
+        QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Smile"));
+}
+
+RK_TEST_MAIN(TestRkEzPropertiesControl)
+#include "tst_rkezpropertiescontrol.moc"
