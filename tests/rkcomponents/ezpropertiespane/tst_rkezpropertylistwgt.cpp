@@ -118,27 +118,13 @@ void TestRkEzPropertyListWgt::rowsForFloatPropertiesOnly()
     auto* other = m_properties[1].get();
     RkEzPropertyListWgt* list = makeList({jaw, &flag, &count, other});
     QVERIFY(list);
-    QCOMPARE(list->objectName(), QStringLiteral("ShapePropertyListWgt"));
-    QCOMPARE(list->getHeader()->model()->headerData(0, Qt::Horizontal).toString(),
-             QStringLiteral("Name"));
-    QCOMPARE(list->getHeader()->model()->headerData(1, Qt::Horizontal).toString(),
-             QStringLiteral("Value"));
-
     const QList<RkEzPropertiesSlider*> rows = list->getRows();
     QCOMPARE(rows.count(), 2);
     QCOMPARE(rows[0]->getProperty(), jaw);
     QCOMPARE(rows[1]->getProperty(), other);
-    QVERIFY(rows[0]->isVisible());
     QVERIFY(rows[0]->y() < rows[1]->y());
     QCOMPARE(nameLabel(rows[0])->text(), QStringLiteral("Jaw"));
     QCOMPARE(rows[0]->getSlider()->getValueText(), QStringLiteral("20.0%"));
-
-    list->clear();
-    QVERIFY(list->getRows().isEmpty());
-    QPointer<RkEzPropertiesSlider> gone = rows[0];
-    QTest::qWait(0);
-    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    QVERIFY(!gone);
 }
 
 void TestRkEzPropertyListWgt::rowEditsAreOneUndoEntry()
@@ -211,14 +197,6 @@ void TestRkEzPropertyListWgt::nameColumnWidth()
     QCOMPARE(header->sectionSize(0), fit);
     QCOMPARE(longName->width(), fit);
     QCOMPARE(longName->text(), longLabel);
-
-    // Every list shares the width.
-    auto* second = new RkEzPropertyListWgt(m_window.get(), nullptr);
-    second->setGeometry(0, 310, 400, 80);
-    second->addProperties({m_properties[0].get()});
-    second->show();
-    QCOMPARE(second->getHeader()->sectionSize(0), fit);
-    QCOMPARE(nameLabel(second->getRows()[0])->width(), fit);
 }
 
 void TestRkEzPropertyListWgt::nameDoubleClickOpensOptions()
@@ -320,13 +298,6 @@ void TestRkEzPropertyListWgt::narrowHeaderKeepsNameColumnAndLabelsTogether()
     QHeaderView* header = wide->getHeader();
     QCOMPARE(header->sectionSize(0), header->minimumSectionSize());
     QCOMPARE(nameLabel(wide->getRows()[0])->width(), 0);
-
-    // And the user widens it again.
-    QTest::mouseDClick(header->viewport(), Qt::LeftButton, {},
-                       QPoint(header->sectionSize(0), header->height() / 2));
-    const int fit = nameLabel(wide->getRows()[0])->fontMetrics().horizontalAdvance(longLabel);
-    QCOMPARE(header->sectionSize(0), fit);
-    QCOMPARE(nameLabel(wide->getRows()[0])->text(), longLabel);
 }
 
 RK_TEST_MAIN(TestRkEzPropertyListWgt)
