@@ -13,6 +13,7 @@
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
 #include "rkscriptsurface.h"
+#include "rksurfacelist.h"
 #include "scene/rkscene.h"
 #include "support/rkgldriver.h"
 #include "viewport/rkviewportmgr.h"
@@ -269,6 +270,7 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&Window"));
     auto* sceneMenus = new RkSceneMenus(&window);
     rkAddSceneList(&window);
+    rkAddSurfaceList(&window);
     rkAddPropertiesDock(&window);
     rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
@@ -281,6 +283,9 @@ int main(int argc, char** argv)
     engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
     rkInstallScriptSurface(engine);
     window.getActionMgr()->buildMenus();
+    // Views have no menu place of their own; the host lists the UV view with the 3D picture.
+    window.getActionMgr()->addActionToMenu(QStringLiteral("RkUVViewAction"),
+                                           window.addMenu(QStringLiteral("&View")));
     // Help stays the last menu.
     window.addMenu(QStringLiteral("&Help"));
     window.resize(1280, 800);

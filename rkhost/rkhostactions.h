@@ -2,5 +2,6 @@
 
 class RkMainWindow;
 
-// The host's own actions (File > Quit, Help > About Plug-ins), given to the action manager.
+// The host's own actions (File > Quit, Edit > Flip UVs of Selection, View > 3D View, Help >
+// About Plug-ins), given to the action manager.
 void rkAddHostActions(RkMainWindow* mainWindow);

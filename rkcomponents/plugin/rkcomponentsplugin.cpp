@@ -10,6 +10,8 @@
 #include "rktclassfactory.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
+#include "rkuvview.h"
+#include "rkuvviewaction.h"
 
 // Everything here is set up while the module loads, in the order written: the plug-in object
 // first, then one factory per class in registration order. The host identifies the classes by
@@ -51,6 +53,9 @@ ComponentsPlugin s_plugin;
 
 RK_NAMED_FACTORY(RkToolPane, "56C51F21-B8D3-4895-9E00-6C8975018A22")
 RK_NAMED_FACTORY(RkToolPaneAction, "255648F4-B646-4dec-B18C-A5FDB71B8C61")
+
+RK_NAMED_FACTORY(RkUVView, "FF850F0D-617B-4717-93BF-7CF68542C829")
+RK_NAMED_FACTORY(RkUVViewAction, "98DD6C5E-D2CF-4dc1-B5D2-D2EBE73D274B")
 
 RK_NAMED_FACTORY(RkEzMixers, "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixer, "19054e20-bdb2-11de-a0a6-0002a5d5c51b")

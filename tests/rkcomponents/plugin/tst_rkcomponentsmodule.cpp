@@ -149,6 +149,7 @@ void TestRkComponentsModule::factoryTableOrder()
     // The classes the module has so far; a class added to the module is added here too.
     const QStringList built = {
         QStringLiteral("RkToolPane"),        QStringLiteral("RkToolPaneAction"),
+        QStringLiteral("RkUVView"),          QStringLiteral("RkUVViewAction"),
         QStringLiteral("RkEzMixers"),        QStringLiteral("RkEzMixer"),
         QStringLiteral("RkEzMixerControl"),  QStringLiteral("RkEzMixerDriver"),
         QStringLiteral("RkFullScreenAction")};
