@@ -21,7 +21,9 @@
 #include <QApplication>
 #include <QCommandLineParser>
 #include <QDir>
+#include <QDockWidget>
 #include <QFile>
+#include <QGLWidget>
 #include <QMenu>
 #include <QPainter>
 #include <QScreen>
@@ -169,6 +171,12 @@ private:
     void requestFrame()
     {
         QCoreApplication::sendPostedEvents();
+        // A view that took the 3D picture's place (the UV view) hides the scene viewport: then
+        // there is no frame to wait for.
+        if (!m_view->isVisible()) {
+            QTimer::singleShot(0, this, &Screenshot::save);
+            return;
+        }
         // Queued: the picture is taken outside the paint that presented the frame.
         connect(m_view, &Rk3DViewport::framePresented, this, &Screenshot::save,
                 Qt::QueuedConnection);
@@ -181,14 +189,28 @@ private:
             return;
         m_done = true;
         m_deadline.stop();
-        const QImage picture = m_view->drawForGrab();
-        if (picture.isNull()) {
-            std::fprintf(stderr, "rkhost: cannot read the 3D viewport's picture back\n");
-            QCoreApplication::exit(1);
-            return;
-        }
         QImage shot = m_window->grab().toImage();
-        QPainter(&shot).drawImage(m_view->mapTo(m_window, QPoint()), picture);
+        QPainter painter(&shot);
+        // A widget grab leaves OpenGL surfaces out: each visible one is drawn and read back.
+        for (QGLWidget* gl : m_window->findChildren<QGLWidget*>()) {
+            if (!gl->isVisible())
+                continue;
+            QImage picture;
+            if (gl == m_view) {
+                picture = m_view->drawForGrab();
+            } else {
+                gl->updateGL();
+                picture = gl->grabFrameBuffer();
+            }
+            if (picture.isNull()) {
+                std::fprintf(stderr, "rkhost: cannot read the picture of %s back\n",
+                             qPrintable(gl->objectName()));
+                QCoreApplication::exit(1);
+                return;
+            }
+            painter.drawImage(gl->mapTo(m_window, QPoint()), picture);
+        }
+        painter.end();
         const bool saved = shot.save(m_fileName, "PNG");
         if (!saved)
             std::fprintf(stderr, "rkhost: cannot write %s\n", qPrintable(m_fileName));
@@ -289,6 +311,9 @@ int main(int argc, char** argv)
     // Help stays the last menu.
     window.addMenu(QStringLiteral("&Help"));
     window.resize(1280, 800);
+    // The docks on the left keep room for names, whatever the view in the middle asks for.
+    if (auto* sceneDock = window.findChild<QDockWidget*>(QStringLiteral("SceneDock")))
+        window.resizeDocks({sceneDock}, {250}, Qt::Horizontal);
     window.show();
     if (!parser.positionalArguments().isEmpty() &&
         !openStartScene(parser.positionalArguments().constFirst(), sceneMenus,

@@ -143,6 +143,12 @@ RkSurfaceList* rkAddSurfaceList(RkMainWindow* window)
     dock->setObjectName(QStringLiteral("SurfacesDock"));
     auto* list = new RkSurfaceList(dock);
     dock->setWidget(list);
-    window->addDockWidget(Qt::LeftDockWidgetArea, dock);
+    // Beside the scene list, as a tab of the same dock area; the scene list stays in front.
+    if (auto* scene = window->findChild<QDockWidget*>(QStringLiteral("SceneDock"))) {
+        window->tabifyDockWidget(scene, dock);
+        scene->raise();
+    } else {
+        window->addDockWidget(Qt::LeftDockWidgetArea, dock);
+    }
     return list;
 }
