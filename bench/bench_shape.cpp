@@ -1,13 +1,20 @@
-// The Shape tab's mixing handle: BM_MixDrag/N times one mouse move of the handle during a drag
-// over N tiles (up to the eight of a page), each tile's morph written and recorded for undo.
+// The Shape tab's icon grid: BM_MixDrag/N times one mouse move of the mixing handle during a drag
+// over N tiles (up to the eight of a page), each tile's morph written and recorded for undo;
+// BM_ThumbnailPage times the eight thumbnails of a page made through the grid's own timer.
+#include "app/rkmainwindow.h"
+#include "demo/rkdemoscene.h"
 #include "properties/rkfloatproperty.h"
+#include "render/rk3dviewport.h"
 #include "rkbenchmain.h"
+#include "rkezicongridwgt.h"
+#include "rkezpropertiescontrol.h"
 #include "rkezpropertiesdragger.h"
+#include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
 
-#include <QGridLayout>
 #include <QMouseEvent>
+#include <QTimer>
 #include <QWidget>
 
 #include <benchmark/benchmark.h>
@@ -27,36 +34,30 @@ void sendMouse(QWidget* widget, QEvent::Type type, const QPoint& local, Qt::Mous
 static void BM_MixDrag(benchmark::State& state)
 {
     const int n = int(state.range(0));
-    QWidget page;
-    auto* grid = new QGridLayout(&page);
-    grid->setContentsMargins(0, 0, 0, 0);
-    grid->setSpacing(0);
-    page.resize(240, 240);
     RkSkeleton figure;
-    auto* dragger = new RkEzPropertiesDragger(&page);
+    QVector<RkProperty*> set;
     for (int i = 0; i < n; ++i) {
-        const int cell = i < 4 ? i : i + 1;
-        auto* tile = new QWidget(&page);
-        tile->setFixedSize(80, 80);
-        grid->addWidget(tile, cell / 3, cell % 3);
         const QString name = QString("Morph %1").arg(i);
         auto* morph = new RkFloatProperty(name, name);
         figure.addProperty(morph, QStringLiteral("Morphs"));
-        dragger->addTile(tile, morph);
+        set.append(morph);
     }
-    dragger->setMixArea(grid);
-    page.show();
-    grid->activate();
-    dragger->setGeometry(grid->cellRect(1, 1));
-    dragger->raise();
+    RkEzIconGridWgt grid(nullptr, nullptr);
+    grid.resize(grid.sizeHint());
+    grid.addProperties(set);
+    grid.show();
+    QCoreApplication::processEvents();
+    RkEzPropertiesDragger* dragger = grid.getDragger();
+    const QRect bounds = grid.draggerBounds();
 
-    const QPoint grab(40, 40);
+    const QPoint grab(20, 20);
     const QPoint start = dragger->pos();
     sendMouse(dragger, QEvent::MouseButtonPress, grab, Qt::LeftButton, Qt::LeftButton);
     int64_t step = 0;
     for (auto _ : state) {
         // The handle wanders over the whole page, as under a dragging hand.
-        const QPoint target(int(step * 7 % 161), int(step * 13 % 161));
+        const QPoint target(bounds.left() + int(step * 7 % (bounds.width() + 1)),
+                            bounds.top() + int(step * 13 % (bounds.height() + 1)));
         ++step;
         const QPoint local = grab + target - dragger->pos();
         sendMouse(dragger, QEvent::MouseMove, local, Qt::NoButton, Qt::LeftButton);
@@ -77,4 +78,50 @@ static void BM_MixDrag(benchmark::State& state)
 }
 BENCHMARK(BM_MixDrag)->Arg(8)->Unit(benchmark::kMicrosecond);
 
-RK_BENCHMARK_MAIN(false)
+// The eight thumbnails of one page, made by the grid's timer at the tiles' size in the pane, each
+// with its morph dialled in and the camera framed, all taken back through cancelled holds.
+static void BM_ThumbnailPage(benchmark::State& state)
+{
+    rkScene->clear();
+    RkSkeleton* figure = rkBuildDemoScene(rkScene);
+    rkScene->selectNode(figure);
+    RkMainWindow window;
+    window.resize(1024, 768);
+    auto* view = new Rk3DViewport;
+    window.setSceneWidget(view);
+    window.show();
+    QCoreApplication::processEvents();
+    if (!view->canHardwareRender()) {
+        state.SkipWithError("no offscreen rendering here");
+        return;
+    }
+    QVector<RkProperty*> set;
+    for (const RkDemoMorph& m : rkDemoMorphs()) {
+        if (set.size() < 8)
+            set.append(figure->findProperty(m.name));
+    }
+    RkEzIconGridWgt grid(nullptr, nullptr);
+    grid.resize(grid.sizeHint());
+    grid.addProperties(set);
+    grid.show();
+    QCoreApplication::processEvents();
+
+    for (auto _ : state) {
+        grid.scheduleMakeImages();
+        while (grid.getTimer()->isActive())
+            QCoreApplication::processEvents();
+    }
+    state.SetItemsProcessed(state.iterations() * grid.getTiles().size());
+    const RkEzPropertiesControl* tile = grid.getTiles().first();
+    if (tile->getImage().isNull())
+        state.SkipWithError("no thumbnail was made");
+    state.SetLabel(QString("%1x%2 px")
+                       .arg(tile->getImageSize().width())
+                       .arg(tile->getImageSize().height())
+                       .toStdString());
+    rkUndoStack->clear();
+    rkScene->clear();
+}
+BENCHMARK(BM_ThumbnailPage)->Unit(benchmark::kMillisecond)->UseRealTime();
+
+RK_BENCHMARK_MAIN(true)

@@ -1,37 +1,27 @@
 #include "rkezpropertiesdragger.h"
 
-#include "properties/rkfloatproperty.h"
+#include "rkezicongridwgt.h"
 #include "undo/rkundostack.h"
 #include "undo/rkundostackhold.h"
 
 #include <QLabel>
-#include <QLayout>
 #include <QMouseEvent>
 #include <QPainter>
 #include <QPointer>
 #include <QPushButton>
 #include <QVBoxLayout>
-#include <QVector>
 
 #include <algorithm>
-#include <cmath>
 
 namespace
 {
 
 const QString kMixCaption = QStringLiteral("Mixer Drag");
 
-struct Tile {
-    QPointer<QWidget> widget;
-    QPointer<RkFloatProperty> morph;
-    float snapshot = 0.f;
-};
-
 } // namespace
 
 struct RkEzPropertiesDragger::Private {
-    QVector<Tile> tiles;
-    QPointer<QLayout> mixArea;
+    QPointer<RkEzIconGridWgt> grid;
     QPoint startPos;
     QPoint startCursor;
     std::unique_ptr<RkUndoStackHold> hold;
@@ -40,9 +30,10 @@ struct RkEzPropertiesDragger::Private {
     QPushButton* undoButton = nullptr;
 };
 
-RkEzPropertiesDragger::RkEzPropertiesDragger(QWidget* parent)
+RkEzPropertiesDragger::RkEzPropertiesDragger(QWidget* parent, RkEzIconGridWgt* grid)
     : QWidget(parent), d(std::make_unique<Private>())
 {
+    d->grid = grid;
     setObjectName(QStringLiteral("ShapePropertiesDragger"));
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(10, 10, 10, 10);
@@ -86,46 +77,6 @@ void RkEzPropertiesDragger::setHandleVisible(bool visible)
     d->handleVisible = visible;
 }
 
-void RkEzPropertiesDragger::addTile(QWidget* tile, RkFloatProperty* morph)
-{
-    Tile t;
-    t.widget = tile;
-    t.morph = morph;
-    t.snapshot = morph ? morph->getValue() : 0.f;
-    d->tiles.append(t);
-}
-
-void RkEzPropertiesDragger::clearTiles()
-{
-    d->tiles.clear();
-}
-
-void RkEzPropertiesDragger::setMixArea(QLayout* layout)
-{
-    d->mixArea = layout;
-}
-
-QRect RkEzPropertiesDragger::draggerBounds() const
-{
-    QRect area;
-    if (d->mixArea)
-        area = d->mixArea->contentsRect();
-    else if (parentWidget())
-        area = parentWidget()->contentsRect();
-    area.setRight(area.right() - width());
-    area.setBottom(area.bottom() - height());
-    for (const Tile& t : qAsConst(d->tiles)) {
-        if (!t.widget)
-            continue;
-        const QPoint corner = t.widget->pos();
-        area.setLeft(std::min(area.left(), corner.x()));
-        area.setTop(std::min(area.top(), corner.y()));
-        area.setRight(std::max(area.right(), corner.x()));
-        area.setBottom(std::max(area.bottom(), corner.y()));
-    }
-    return area;
-}
-
 bool RkEzPropertiesDragger::isDragging() const
 {
     return d->dragging;
@@ -143,11 +94,9 @@ void RkEzPropertiesDragger::startDrag(const QPoint& globalPos)
     d->dragging = true;
     d->startPos = pos();
     d->startCursor = globalPos;
-    Q_EMIT mixStarting();
-    for (Tile& t : d->tiles) {
-        if (t.morph)
-            t.snapshot = t.morph->getValue();
-    }
+    // Ends any hover preview of a tile before its value is taken.
+    if (d->grid)
+        d->grid->snapshotTileValues();
     d->hold = std::make_unique<RkUndoStackHold>();
     update();
 }
@@ -161,39 +110,12 @@ void RkEzPropertiesDragger::endDrag()
     if (d->hold) {
         // Taken out first: accepting changes the undo caption, whose slot sees a closed drag.
         const std::unique_ptr<RkUndoStackHold> hold = std::move(d->hold);
-        if (tileValuesChanged())
+        if (d->grid && d->grid->tileValuesChanged())
             hold->accept(kMixCaption);
         else
             hold->cancel();
     }
     update();
-}
-
-// Each morph gets its value from the drag's start plus the handle's closeness to the tile's
-// corner, in [0, 1]: no clamping here, a clamped morph limits itself. A morph already at its
-// target is left alone, so a drag far from every tile writes nothing.
-void RkEzPropertiesDragger::mixTilesAt(const QPoint& handle)
-{
-    for (const Tile& t : qAsConst(d->tiles)) {
-        if (!t.widget || !t.morph)
-            continue;
-        const QPoint corner = t.widget->pos();
-        const float dx = float(handle.x() - corner.x());
-        const float dy = float(handle.y() - corner.y());
-        const float distance = std::sqrt(dx * dx + dy * dy);
-        const float reach = float(std::min(t.widget->width(), t.widget->height()));
-        const float influence = reach > distance ? 1.f - distance / reach : 0.f;
-        const float target = t.snapshot + influence;
-        if (target != t.morph->getValue())
-            t.morph->setValue(target);
-    }
-}
-
-bool RkEzPropertiesDragger::tileValuesChanged() const
-{
-    return std::any_of(d->tiles.cbegin(), d->tiles.cend(), [](const Tile& t) {
-        return t.morph && !(t.morph->getValue() == t.snapshot);
-    });
 }
 
 void RkEzPropertiesDragger::mousePressEvent(QMouseEvent* event)
@@ -205,11 +127,15 @@ void RkEzPropertiesDragger::mouseMoveEvent(QMouseEvent* event)
 {
     if (!d->dragging)
         startDrag(event->globalPos());
+    if (!d->grid)
+        return;
     const QPoint p = d->startPos + (event->globalPos() - d->startCursor);
-    const QRect b = draggerBounds();
+    const QRect b = d->grid->draggerBounds();
     move(std::max(b.left(), std::min(p.x(), b.right())),
          std::max(b.top(), std::min(p.y(), b.bottom())));
-    mixTilesAt(pos());
+    // No clamping here: each tile adds the handle's closeness to its snapshot, and a clamped
+    // morph limits itself.
+    d->grid->mixTilesAt(pos().x(), pos().y());
 }
 
 void RkEzPropertiesDragger::mouseReleaseEvent(QMouseEvent*)

@@ -4,44 +4,31 @@
 
 #include <memory>
 
-class QLayout;
-class RkFloatProperty;
+class RkEzIconGridWgt;
 
 // The "Drag To Mix Morphs" handle in the middle of a page's tiles. While it is dragged, every
 // tile it comes close to has its morph raised by the closeness, on top of the value the morph had
 // when the drag began; on release the handle jumps back and the changes are one undo entry
 // "Mixer Drag". Its "Undo" button shows while such an entry is the one to undo.
 //
-// A tile is seen only as a widget beside the handle (same parent; its top-left corner and size
-// count) and the morph it shows.
+// The mixing itself is the grid's: it snapshots, mixes and compares its tiles and knows where the
+// handle may go.
 class RkEzPropertiesDragger : public QWidget
 {
     Q_OBJECT
 public:
-    explicit RkEzPropertiesDragger(QWidget* parent);
+    // The grid is watched, not owned (it is normally the parent too); without it a drag moves
+    // nothing and mixes nothing.
+    RkEzPropertiesDragger(QWidget* parent, RkEzIconGridWgt* grid);
     // A drag still running ends here as a release would, so no undo hold stays open.
     ~RkEzPropertiesDragger() override;
 
     // Frame and arrows are painted only when set; takes effect at the next paint.
     void setHandleVisible(bool visible);
 
-    // The tiles in the grid's order. Both are watched, not owned: a tile or morph deleted during
-    // a drag is skipped from then on.
-    void addTile(QWidget* tile, RkFloatProperty* morph);
-    void clearTiles();
-    // The layout whose contents the handle stays in (the grid of tiles); without one, the
-    // parent's contents.
-    void setMixArea(QLayout* layout);
-
-    // Where the handle's top-left corner may go: the mix area less the handle's own size,
-    // widened to every tile's top-left corner.
-    QRect draggerBounds() const;
     bool isDragging() const;
-
-Q_SIGNALS:
-    // A drag begins; the morphs' values are taken right after it, so a tile ends any preview
-    // of its morph here.
-    void mixStarting();
+    // Ends a running drag as a release would; nothing when none runs.
+    void endDrag();
 
 protected Q_SLOTS:
     void undoCaptionChanged(const QString& caption);
@@ -54,9 +41,6 @@ protected:
 
 private:
     void startDrag(const QPoint& globalPos);
-    void endDrag();
-    void mixTilesAt(const QPoint& handle);
-    bool tileValuesChanged() const;
 
     struct Private;
     std::unique_ptr<Private> d;

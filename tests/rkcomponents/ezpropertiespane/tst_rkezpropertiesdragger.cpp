@@ -1,6 +1,8 @@
 #include "rkezpropertiesdragger.h"
 
 #include "properties/rkfloatproperty.h"
+#include "rkezicongridwgt.h"
+#include "rkezpropertiescontrol.h"
 #include "rktestmain.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
@@ -10,48 +12,33 @@
 #include <QPointer>
 #include <QPushButton>
 
-#include <cmath>
-
 namespace
 {
 
-// Eight plain tiles of 80 by 80 around the handle in the middle cell, each showing one morph of
-// a figure; tile i's top-left corner is the handle's position that raises its morph fully.
+// An icon grid of eight morph tiles around the handle, as a page shows it.
 struct Page {
-    QWidget widget;
-    QGridLayout* grid = nullptr;
-    QVector<QWidget*> tiles;
     RkSkeleton figure;
     QVector<QPointer<RkFloatProperty>> morphs;
+    RkEzIconGridWgt grid{nullptr, nullptr};
+    QVector<RkEzPropertiesControl*> tiles;
     RkEzPropertiesDragger* dragger = nullptr;
-    QPoint grab{40, 40};
+    QPoint grab{20, 20};
 
     Page()
     {
-        grid = new QGridLayout(&widget);
-        grid->setContentsMargins(0, 0, 0, 0);
-        grid->setSpacing(0);
-        widget.resize(240, 240);
-        for (int cell = 0; cell < 9; ++cell) {
-            if (cell == 4)
-                continue;
-            auto* tile = new QWidget(&widget);
-            tile->setFixedSize(80, 80);
-            grid->addWidget(tile, cell / 3, cell % 3);
-            tiles.append(tile);
-            const QString name = QString("Morph %1").arg(tiles.size() - 1);
+        QVector<RkProperty*> set;
+        for (int i = 0; i < 8; ++i) {
+            const QString name = QString("Morph %1").arg(i);
             auto* morph = new RkFloatProperty(name, name);
             figure.addProperty(morph, QStringLiteral("Morphs"));
             morphs.append(morph);
+            set.append(morph);
         }
-        dragger = new RkEzPropertiesDragger(&widget);
-        for (int i = 0; i < tiles.size(); ++i)
-            dragger->addTile(tiles[i], morphs[i]);
-        dragger->setMixArea(grid);
-        widget.show();
-        grid->activate();
-        dragger->setGeometry(grid->cellRect(1, 1));
-        dragger->setHandleVisible(true);
+        grid.resize(300, 360);
+        grid.addProperties(set);
+        grid.show();
+        tiles = grid.getTiles();
+        dragger = grid.getDragger();
     }
 
     QVector<float> values() const
@@ -93,32 +80,33 @@ void TestRkEzPropertiesDragger::cleanup()
 void TestRkEzPropertiesDragger::dragMixesIntoOneUndoEntry()
 {
     Page page;
-    QVERIFY(QTest::qWaitForWindowExposed(&page.widget));
-    QCOMPARE(page.dragger->pos(), QPoint(80, 80));
+    QVERIFY(QTest::qWaitForWindowExposed(&page.grid));
+    const QPoint start = page.grid.findChild<QGridLayout*>()->cellRect(1, 1).topLeft();
+    QCOMPARE(page.dragger->pos(), start);
     auto* undoButton = page.dragger->findChild<QPushButton*>(QStringLiteral("Undo"));
     QVERIFY(undoButton && undoButton->isHidden());
-    // Morph 0 shows a hover preview at full strength, which ends before the drag takes values.
-    page.morphs[0]->setValue(1.f);
-    connect(page.dragger, &RkEzPropertiesDragger::mixStarting, &page.widget,
-            [&page] { page.morphs[0]->setValue(0.4f); });
+    // Morph 0 at 0.4 shows a hover preview at full strength, which the press ends.
+    page.morphs[0]->setValue(0.4f);
+    page.tiles[0]->beginPreview();
+    QCOMPARE(page.morphs[0]->getValue(), 1.f);
     const int entries = rkUndoStack->count();
 
-    // Halfway to morph 0's corner touches its three nearest tiles alike.
+    // Near tile 1's corner only tile 1 rises, by the closeness.
+    const int reach = std::min(page.tiles[1]->width(), page.tiles[1]->height());
     page.press();
-    page.moveHandleTo(QPoint(40, 40));
-    QVector<float> v = page.values();
-    QVERIFY(qAbs(v[1] - (1.f - std::sqrt(2.f) / 2.f)) < 1e-5f);
-    QCOMPARE(v, (QVector<float>{0.4f + v[1], v[1], 0, v[1], 0, 0, 0, 0}));
-    // On the corner: no clamping, and the tiles left behind fall back.
+    QVERIFY(!page.tiles[0]->isPreviewing());
+    page.moveHandleTo(page.tiles[1]->pos() + QPoint(0, 10));
+    QCOMPARE(page.values(), (QVector<float>{0.4f, 1.f - 10.f / reach, 0, 0, 0, 0, 0, 0}));
+    // On tile 0's corner: no clamping, and the tile left behind falls back.
     page.moveHandleTo(QPoint(-30, -50));
-    QCOMPARE(page.dragger->pos(), QPoint(0, 0));
+    QCOMPARE(page.dragger->pos(), page.tiles[0]->pos());
     QCOMPARE(page.values(), (QVector<float>{1.4f, 0, 0, 0, 0, 0, 0, 0}));
     // Past the far corner the handle stops on the last tile's corner.
-    page.moveHandleTo(QPoint(400, 300));
-    QCOMPARE(page.dragger->pos(), QPoint(160, 160));
+    page.moveHandleTo(QPoint(900, 900));
+    QCOMPARE(page.dragger->pos(), page.tiles[7]->pos());
     page.release();
 
-    QCOMPARE(page.dragger->pos(), QPoint(80, 80));
+    QCOMPARE(page.dragger->pos(), start);
     const QVector<float> mixed{0.4f, 0, 0, 0, 0, 0, 0, 1.f};
     QCOMPARE(page.values(), mixed);
     QCOMPARE(rkUndoStack->count(), entries + 1);
@@ -128,7 +116,7 @@ void TestRkEzPropertiesDragger::dragMixesIntoOneUndoEntry()
 
     // A drag that moves nothing leaves no entry.
     page.press();
-    page.moveHandleTo(QPoint(80, 80));
+    page.moveHandleTo(start);
     page.release();
     QCOMPARE(rkUndoStack->count(), entries + 1);
 
@@ -149,20 +137,21 @@ void TestRkEzPropertiesDragger::dragMixesIntoOneUndoEntry()
 void TestRkEzPropertiesDragger::goneTilesAndDestroyedHandle()
 {
     Page page;
-    QVERIFY(QTest::qWaitForWindowExposed(&page.widget));
+    QVERIFY(QTest::qWaitForWindowExposed(&page.grid));
     const int entries = rkUndoStack->count();
 
     page.press();
-    page.moveHandleTo(QPoint(0, 0));
+    page.moveHandleTo(page.tiles[0]->pos());
     // Morph 1 and tile 3 go in the middle of the drag; the handle passes over their places.
+    const QPoint tile3 = page.tiles[3]->pos();
     page.figure.removeProperty(page.morphs[1]);
     delete page.morphs[1];
     delete page.tiles[3];
     QVERIFY(!page.morphs[1]);
-    page.moveHandleTo(QPoint(80, 0));
-    page.moveHandleTo(QPoint(0, 80));
+    page.moveHandleTo(page.tiles[1]->pos());
+    page.moveHandleTo(tile3);
     QCOMPARE(page.values(), (QVector<float>{0, -1.f, 0, 0, 0, 0, 0, 0}));
-    page.moveHandleTo(QPoint(20, 20));
+    page.moveHandleTo(page.tiles[0]->pos() + QPoint(5, 5));
     const QVector<float> mixed = page.values();
     QVERIFY(mixed[0] > 0.5f);
 
