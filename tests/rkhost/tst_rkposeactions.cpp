@@ -319,6 +319,7 @@ void TestRkPoseActions::symmetryPairsAndMirrors()
     left->getXRotate()->setValue(10);
     left->getYRotate()->setValue(20);
     left->getZRotate()->setValue(-50);
+    figure->findBone("lForeArm")->getYRotate()->setValue(60);
     const int entries = undoCount();
     QVERIFY(RkSymmetry::mirror(figure, RkSymmetry::Direction::LeftToRight, "Symmetry"));
     QCOMPARE(undoCount(), entries + 1);
