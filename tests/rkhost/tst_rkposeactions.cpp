@@ -12,6 +12,9 @@
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
 
+#include <QRadioButton>
+#include <QTimer>
+
 class TestRkPoseActions : public QObject
 {
     Q_OBJECT
@@ -343,6 +346,23 @@ void TestRkPoseActions::symmetryPairsAndMirrors()
     QCOMPARE(figure->findBone("lThigh")->getZRotate()->getValue(), -15.0f);
     // The left arm was overwritten by the unposed right one.
     QCOMPARE(left->getZRotate()->getValue(), 0.0f);
+
+    // The action asks for the direction first.
+    figure->findBone("rHand")->getZRotate()->setValue(25);
+    rkScene->selectNode(figure->findBone("head"));
+    const int beforeAction = undoCount();
+    QTimer::singleShot(0, this, [] {
+        if (QWidget* dialog = QApplication::activeModalWidget()) {
+            const auto buttons = dialog->findChildren<QRadioButton*>();
+            if (buttons.size() == 2)
+                buttons.at(1)->click();
+            QTest::keyClick(dialog, Qt::Key_Return);
+        }
+    });
+    action("RkSymmetryAction")->trigger();
+    QCOMPARE(undoCount(), beforeAction + 1);
+    QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Symmetry"));
+    QCOMPARE(figure->findBone("lHand")->getZRotate()->getValue(), -25.0f);
 }
 
 void TestRkPoseActions::moveToFloor_data()
