@@ -369,10 +369,18 @@ QString lockText(Scope scope, bool on)
 
 QString lockDescription(Scope scope, bool on)
 {
-    const QString what = scope == Scope::FigureMorphs ? RkAction::tr("the selected figure's morphs")
-                         : scope == Scope::Transforms
-                             ? scopeObject(scope)
-                             : RkAction::tr("every property of the selected items");
+    QString what;
+    switch (scope) {
+    case Scope::FigureMorphs:
+        what = RkAction::tr("the selected figure's morphs");
+        break;
+    case Scope::Transforms:
+        what = scopeObject(scope);
+        break;
+    default:
+        what = RkAction::tr("every property of the selected items");
+        break;
+    }
     return on ? RkAction::tr("Lock %1 against changes").arg(what)
               : RkAction::tr("Let %1 be changed again").arg(what);
 }
