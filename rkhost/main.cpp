@@ -9,6 +9,7 @@
 #include "rkaboutplugins.h"
 #include "rkdemotools.h"
 #include "rkhostactions.h"
+#include "rkposeactions.h"
 #include "rkpropertiesdock.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
@@ -289,6 +290,7 @@ int main(int argc, char** argv)
     window.addMenu(QStringLiteral("&File"));
     window.addMenu(QStringLiteral("&Edit"));
     window.addMenu(QStringLiteral("&View"));
+    window.addMenu(QStringLiteral("&Figure"));
     window.addMenu(QStringLiteral("&Window"));
     auto* sceneMenus = new RkSceneMenus(&window);
     rkAddSceneList(&window);
@@ -296,6 +298,7 @@ int main(int argc, char** argv)
     rkAddPropertiesDock(&window);
     rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
+    rkAddPoseActions(&window);
     rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());
 
     core.getPluginMgr()->loadModules(folder);

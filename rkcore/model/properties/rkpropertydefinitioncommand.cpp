@@ -6,8 +6,8 @@
 bool RkPropertyDefinitionCommand::State::operator==(const State& other) const
 {
     return label == other.label && flags == other.flags && clamped == other.clamped &&
-           min == other.min && max == other.max && sensitivity == other.sensitivity &&
-           percent == other.percent;
+           min == other.min && max == other.max && memorized == other.memorized &&
+           sensitivity == other.sensitivity && percent == other.percent;
 }
 
 RkPropertyDefinitionCommand::RkPropertyDefinitionCommand(RkProperty* property,
@@ -59,12 +59,14 @@ RkPropertyDefinitionCommand::State RkPropertyDefinitionCommand::read(const RkPro
         state.clamped = f->isClamped();
         state.min = f->getMin();
         state.max = f->getMax();
+        state.memorized = f->getMemorizedValue();
         state.sensitivity = f->getSensitivity();
         state.percent = f->getDisplayAsPercent();
     } else if (auto* i = qobject_cast<const RkIntProperty*>(property)) {
         state.clamped = i->isClamped();
         state.min = i->getMin();
         state.max = i->getMax();
+        state.memorized = i->getMemorizedValue();
     }
     return state;
 }
@@ -78,10 +80,15 @@ void RkPropertyDefinitionCommand::apply(RkProperty* property, const State& state
     if (auto* f = qobject_cast<RkFloatProperty*>(property)) {
         f->setMinMax(float(state.min), float(state.max));
         f->setClamped(state.clamped);
+        // Left alone when equal, so a property that never memorized keeps following its default.
+        if (f->getMemorizedValue() != float(state.memorized))
+            f->setMemorizedValue(float(state.memorized));
         f->setSensitivity(state.sensitivity);
         f->setDisplayAsPercent(state.percent);
     } else if (auto* i = qobject_cast<RkIntProperty*>(property)) {
         i->setMinMax(int(state.min), int(state.max));
         i->setClamped(state.clamped);
+        if (i->getMemorizedValue() != int(state.memorized))
+            i->setMemorizedValue(int(state.memorized));
     }
 }

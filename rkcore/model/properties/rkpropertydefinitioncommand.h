@@ -7,9 +7,9 @@
 class RkProperty;
 
 // Records a change of a property's definition: its label, hidden state and lock, and for numeric
-// properties the limits and clamping, for float ones the sensitivity and percent display. Made
-// before the change (it takes the state then), told afterChange() when the change is done, then
-// pushed. Values are not part of it: value changes record themselves.
+// properties the limits, clamping and memorized value, for float ones the sensitivity and percent
+// display. Made before the change (it takes the state then), told afterChange() when the change is
+// done, then pushed. Values are not part of it: value changes record themselves.
 class RKCORE_EXPORT RkPropertyDefinitionCommand : public RkUndoCommand
 {
 public:
@@ -30,6 +30,7 @@ public:
         int flags = 0;
         bool clamped = false;
         double min = 0, max = 0;
+        double memorized = 0;
         float sensitivity = 0;
         bool percent = false;
         bool operator==(const State& other) const;
