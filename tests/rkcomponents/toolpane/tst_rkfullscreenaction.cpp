@@ -15,7 +15,6 @@ class TestRkFullScreenAction : public QObject
     Q_OBJECT
 private Q_SLOTS:
     void initTestCase();
-    void texts();
     void withoutMainWindowNothingHappens();
     void fillsTheScreenAndEscapeReturns();
 };
@@ -23,16 +22,6 @@ private Q_SLOTS:
 void TestRkFullScreenAction::initTestCase()
 {
     QVERIFY(rkApp->getPluginMgr()->addPlugin(rkComponentsPlugin()));
-}
-
-void TestRkFullScreenAction::texts()
-{
-    RkFullScreenAction action;
-    QCOMPARE(action.text(), QStringLiteral("Go Full Screen"));
-    QCOMPARE(action.getDescription(), QStringLiteral("Make the main viewport Full Screen"));
-    QCOMPARE(action.getActionGroup(), QStringLiteral("View"));
-    QCOMPARE(action.getDefaultMenuPath(), QStringLiteral("&View"));
-    QVERIFY(!action.isCheckable());
 }
 
 void TestRkFullScreenAction::withoutMainWindowNothingHappens()
