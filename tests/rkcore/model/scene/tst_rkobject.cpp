@@ -187,7 +187,6 @@ void TestRkObject::demoFigureCarriesItsMesh()
     RkSkeleton* figure = rkBuildDemoScene(rkScene);
     QList<RkBone*> bones;
     figure->getAllBones(bones);
-    QVERIFY(bones.size() >= 15);
     for (RkBone* bone : bones) {
         QVERIFY2(bone->getObject() && bone->getObject()->getGeometry(),
                  qPrintable(bone->getName()));

@@ -195,7 +195,6 @@ void TestRkScene::demoContent()
     QVERIFY(figure);
     QList<RkBone*> bones;
     figure->getAllBones(bones);
-    QVERIFY(bones.size() >= 15);
     QStringList boneNames;
     for (RkBone* b : bones) {
         boneNames << b->getName();
