@@ -35,15 +35,22 @@ protected:
     void mousePressEvent(QMouseEvent* event) override { presses.append(event->button()); }
 };
 
-void drag(QWidget* w, QPoint from, int dx)
+// A move with the left button held.
+void moveHeld(QWidget* w, QPoint to)
+{
+    QMouseEvent move(QEvent::MouseMove, to, w->mapToGlobal(to), Qt::NoButton, Qt::LeftButton,
+                     Qt::NoModifier);
+    QApplication::sendEvent(w, &move);
+}
+
+// A user's drag: press, two moves, and the release unless the test still holds the button.
+void drag(QWidget* w, QPoint from, int dx, bool release = true)
 {
     QTest::mousePress(w, Qt::LeftButton, {}, from);
-    for (const QPoint to : {from + QPoint(dx / 2, 0), from + QPoint(dx, 0)}) {
-        QMouseEvent move(QEvent::MouseMove, to, w->mapToGlobal(to), Qt::NoButton, Qt::LeftButton,
-                         Qt::NoModifier);
-        QApplication::sendEvent(w, &move);
-    }
-    QTest::mouseRelease(w, Qt::LeftButton, {}, from + QPoint(dx, 0));
+    moveHeld(w, from + QPoint(dx / 2, 0));
+    moveHeld(w, from + QPoint(dx, 0));
+    if (release)
+        QTest::mouseRelease(w, Qt::LeftButton, {}, from + QPoint(dx, 0));
 }
 
 // Runs the steps on the modal dialog once it is up, then closes it if the steps did not.
@@ -159,10 +166,7 @@ void TestRkPropertyWgt::gestureSetsAllPropertiesInOneEntry()
 
 void TestRkPropertyWgt::escLeavesNoEntryAndNoChange()
 {
-    QTest::mousePress(slider, Qt::LeftButton, {}, slider->calcSliderRect().center());
-    QMouseEvent move(QEvent::MouseMove, slider->calcSliderRect().center() + QPoint(30, 0), QPoint(),
-                     Qt::NoButton, Qt::LeftButton, Qt::NoModifier);
-    QApplication::sendEvent(slider, &move);
+    drag(slider, slider->calcSliderRect().center(), 30, false);
     QCOMPARE(props[2]->getValue(), 0.4f);
     QTest::keyClick(slider, Qt::Key_Escape);
     QTest::mouseRelease(slider, Qt::LeftButton);
@@ -182,12 +186,9 @@ void TestRkPropertyWgt::destroyedPropertyDropsOut()
     QCOMPARE(slider->getValueText(), QStringLiteral("0.200"));
 
     // Gone in the middle of a drag: the rest still make one entry.
-    QTest::mousePress(slider, Qt::LeftButton, {}, slider->calcSliderRect().center());
-    QMouseEvent move(QEvent::MouseMove, slider->calcSliderRect().center() + QPoint(20, 0), QPoint(),
-                     Qt::NoButton, Qt::LeftButton, Qt::NoModifier);
-    QApplication::sendEvent(slider, &move);
+    drag(slider, slider->calcSliderRect().center(), 20, false);
     delete props.takeFirst();
-    QApplication::sendEvent(slider, &move);
+    moveHeld(slider, slider->calcSliderRect().center() + QPoint(20, 0));
     QTest::mouseRelease(slider, Qt::LeftButton);
     QCOMPARE(props[0]->getValue(), 0.4f);
     QCOMPARE(rkUndoStack->count(), 1);
