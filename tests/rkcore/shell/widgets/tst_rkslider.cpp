@@ -204,16 +204,10 @@ void TestRkSlider::typedText_data()
                                   << "10%" << int(Qt::Key_Return) << 0.1f << "1 1 0";
     QTest::newRow("esc") << false << "0.250"
                          << "0.9" << int(Qt::Key_Escape) << 0.25f << "1 0 1";
-    QTest::newRow("abc") << false << "0.250"
-                         << "abc" << int(Qt::Key_Return) << 0.25f << "1 0 1";
-    QTest::newRow("nan") << false << "0.250"
-                         << "nan" << int(Qt::Key_Return) << 0.25f << "1 0 1";
-    QTest::newRow("inf") << false << "0.250"
-                         << "-inf" << int(Qt::Key_Return) << 0.25f << "1 0 1";
-    QTest::newRow("1e999") << false << "0.250"
-                           << "1e999" << int(Qt::Key_Return) << 0.25f << "1 0 1";
-    QTest::newRow("beyond float") << false << "0.250"
-                                  << "1e39" << int(Qt::Key_Return) << 0.25f << "1 0 1";
+    // Text that is no finite float is refused: the edit ends as cancelled.
+    for (const char* refused : {"abc", "nan", "-inf", "1e999", "1e39"})
+        QTest::newRow(refused) << false << "0.250" << refused << int(Qt::Key_Return) << 0.25f
+                               << "1 0 1";
 }
 
 void TestRkSlider::typedText()
