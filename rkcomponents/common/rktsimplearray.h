@@ -50,7 +50,8 @@ public:
         return true;
     }
 
-    // Adds n elements of storage; without keep the old contents are dropped (count stays).
+    // Adds n elements of storage; without keep the old contents are dropped and the array is
+    // empty.
     bool grow(int n, bool keep)
     {
         T* data = static_cast<T*>(rkMalloc(sizeof(T) * std::size_t(m_capacity + n)));
@@ -61,11 +62,18 @@ public:
         rkFree(m_data);
         m_data = data;
         m_capacity += n;
+        if (!keep)
+            m_count = 0;
         return true;
     }
 
     void removeByIndex(int index, int n = 1)
     {
+        if (n < 0) {
+            RK_SOURCE_WARNING(
+                QStringLiteral("Negative count specified in RkTSimpleArray::removeByIndex()"));
+            return;
+        }
         if (index < 0 || index >= m_count) {
             RK_SOURCE_WARNING(
                 QStringLiteral("Index out of range in RkTSimpleArray::removeByIndex()"));

@@ -59,6 +59,12 @@ void TestRkTSimpleArray::growsByBlocks()
         array.append(i);
     QCOMPARE(array.data(), storage);
     QCOMPARE(array.capacity(), 32);
+
+    // Growing without keeping the contents leaves nothing to read.
+    QVERIFY(array.grow(8, false));
+    QCOMPARE(array.capacity(), 40);
+    QCOMPARE(array.count(), 0);
+    QCOMPARE(array.indexOf(0), -1);
 }
 
 void TestRkTSimpleArray::removes()
@@ -75,6 +81,12 @@ void TestRkTSimpleArray::removes()
     QCOMPARE(array.count(), 8);
     QVERIFY(warnings.last().endsWith("Index out of range in RkTSimpleArray::removeByIndex()"));
     QCOMPARE(warnings.size(), 2);
+    // A negative count would move elements from behind the array's end.
+    array.removeByIndex(2, -3);
+    QCOMPARE(array.count(), 8);
+    QCOMPARE(warnings.size(), 3);
+    QVERIFY(
+        warnings.last().endsWith("Negative count specified in RkTSimpleArray::removeByIndex()"));
 
     array.removeByIndex(2, 3); // 0 1 5 6 7
     QCOMPARE(array.count(), 5);
