@@ -628,6 +628,84 @@ void RkPropertyPaneList::clearRightClicked()
     d->rightClicked = false;
 }
 
+// Favourites.
+
+bool RkPropertyPaneList::visitWidgets(
+    RkWidgetGroup* group, const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const
+{
+    QListIterator<RkWidgetGroup*> groups = group->groupListIterator();
+    while (groups.hasNext()) {
+        RkWidgetGroup* child = groups.next();
+        if (child->isActive() && visitWidgets(child, visit))
+            return true;
+    }
+    QListIterator<QWidget*> widgets = group->widgetListIterator();
+    while (widgets.hasNext()) {
+        if (visit(group, widgets.next()))
+            return true;
+    }
+    return false;
+}
+
+bool RkPropertyPaneList::visitWidgets(
+    const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const
+{
+    for (RkWidgetGroup* group : qAsConst(d->groups)) {
+        if (group->isActive() && visitWidgets(group, visit))
+            return true;
+    }
+    return false;
+}
+
+void RkPropertyPaneList::setSelectedFlag(bool global, bool on)
+{
+    visitWidgets([&](RkWidgetGroup* group, QWidget* widget) {
+        auto* propertyWidget = qobject_cast<RkPropertyWgt*>(widget);
+        if (!propertyWidget || !propertyWidget->isSelected())
+            return false;
+        select(propertyWidget, false);
+        // A widget shared by several nodes carries each node's property.
+        for (RkProperty* property : propertyWidget->getProperties()) {
+            if (global)
+                property->setIsGlobalFavorite(on);
+            else
+                property->setIsFavorite(on);
+        }
+        // The figure favourite is gone from this group: hide it until the posted rebuild.
+        if (global && !on)
+            group->setActive(false);
+        return false;
+    });
+}
+
+void RkPropertyPaneList::setSelectedFavorite(bool on)
+{
+    setSelectedFlag(false, on);
+}
+
+void RkPropertyPaneList::setSelectedGlobalFavorite(bool on)
+{
+    setSelectedFlag(true, on);
+}
+
+void RkPropertyPaneList::scanSelection(bool& anyFigure, bool& anyLocal, bool& anyNone) const
+{
+    visitWidgets([&](RkWidgetGroup*, QWidget* widget) {
+        auto* propertyWidget = qobject_cast<RkPropertyWgt*>(widget);
+        RkProperty* property = propertyWidget ? propertyWidget->getFirstProperty() : nullptr;
+        // Clicks select the widget, not its property: either counts as selected.
+        if (property && (propertyWidget->isSelected() || property->isSelected())) {
+            if (property->isGlobalFavorite())
+                anyFigure = true;
+            if (property->isFavorite())
+                anyLocal = true;
+            if (!property->isGlobalFavorite() && !property->isFavorite())
+                anyNone = true;
+        }
+        return anyFigure && anyLocal && anyNone;
+    });
+}
+
 // Remembered view state.
 
 void RkPropertyPaneList::saveViewState()
