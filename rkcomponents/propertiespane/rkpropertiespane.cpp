@@ -18,8 +18,10 @@
 #include <QCoreApplication>
 #include <QCursor>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenu>
 #include <QMouseEvent>
+#include <QScrollBar>
 #include <QStyle>
 
 namespace
@@ -58,6 +60,9 @@ struct RkPropertiesPane::Private {
     RkPropertyPaneList* favoritesList = nullptr;
     RkPropertyPaneList* propertiesList = nullptr;
     RkDividerBar* favoritesDivider = nullptr;
+    QLineEdit* filterField = nullptr;
+    // The filter of the last build: the view state is remembered only of unfiltered lists.
+    QString builtFilter;
     // Owned by the event queue until delivered.
     QEvent* pendingRefresh = nullptr;
     bool refreshBlocked = false;
@@ -87,6 +92,12 @@ RkPropertiesPane::RkPropertiesPane() : RkPane(tr("Parameters")), d(std::make_uni
             &RkPropertiesPane::toggleFavsListHeight);
     connect(d->favoritesDivider, &RkDividerBar::moved, this,
             &RkPropertiesPane::adjustFavsListHeight);
+
+    d->filterField = new QLineEdit(this);
+    d->filterField->setObjectName(QStringLiteral("FilterField"));
+    d->filterField->setPlaceholderText(tr("Filter parameters"));
+    d->filterField->setClearButtonEnabled(true);
+    connect(d->filterField, &QLineEdit::textChanged, this, &RkPropertiesPane::needRefresh);
 
     d->propertiesList = new RkPropertyPaneList(this, QStringLiteral("PropertiesList"));
     d->propertiesList->setMinimumSize(200, 75);
@@ -221,11 +232,15 @@ void RkPropertiesPane::rebuildLists()
     if (RkWidgetGroup* group = d->favoritesList->getGroup(figureFavorites, false))
         d->figureFavsCollapsed = group->isCollapsed();
 
+    const QString filter = d->filterField->text().trimmed();
     for (RkPropertyPaneList* list : {d->propertiesList, d->favoritesList}) {
         list->setMouseOverSliders(d->mouseOverSliders);
-        list->saveViewState();
+        if (list == d->favoritesList || d->builtFilter.isEmpty())
+            list->saveViewState();
         list->clear();
     }
+    d->propertiesList->setFilter(filter);
+    d->builtFilter = filter;
 
     for (RkNode* node : qAsConst(d->nodes)) {
         d->propertiesList->addPropertyGroups(node->getPropertyGroups(), d->showingHidden);
@@ -250,7 +265,11 @@ void RkPropertiesPane::rebuildLists()
     d->favoritesList->setVisible(!d->nodes.isEmpty() && !d->favsMinimized);
     d->favoritesDivider->setVisible(!d->nodes.isEmpty());
 
-    d->propertiesList->restoreViewState();
+    // A filtered list starts at its top; clearing the filter brings the remembered view back.
+    if (filter.isEmpty())
+        d->propertiesList->restoreViewState();
+    else
+        d->propertiesList->verticalScrollBar()->setValue(0);
     d->favoritesList->restoreViewState();
 
     if (RkWidgetGroup* group = d->favoritesList->getGroup(figureFavorites, false))
@@ -279,6 +298,9 @@ void RkPropertiesPane::layoutChildren()
     }
     d->favoritesDivider->setGeometry(m, y, w - 2 * m, dividerHeight);
     y += dividerHeight;
+    const int filterHeight = d->filterField->sizeHint().height();
+    d->filterField->setGeometry(m, y, w - 2 * m, filterHeight);
+    y += filterHeight + m;
     d->propertiesList->setGeometry(m, y, w - 2 * m, h - 1 - m - y);
 }
 

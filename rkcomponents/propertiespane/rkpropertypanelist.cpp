@@ -175,6 +175,7 @@ struct RkPropertyPaneList::Private {
     QList<QPointer<RkProperty>> figureFavorites;
     bool showFavorites = true;
     bool showAllGroups = true;
+    QString filter;
 
     RkListViewState* findViewState(const RkNode* node) const
     {
@@ -226,6 +227,11 @@ void RkPropertyPaneList::setShowFavorites(bool on)
 void RkPropertyPaneList::setShowAllGroups(bool on)
 {
     d->showAllGroups = on;
+}
+
+void RkPropertyPaneList::setFilter(const QString& text)
+{
+    d->filter = text;
 }
 
 void RkPropertyPaneList::setMouseOverSliders(bool on)
@@ -415,6 +421,8 @@ bool RkPropertyPaneList::addGroupProperties(RkPropertyGroup* group)
     RkWidgetGroup* widgetGroup = nullptr;
     for (RkProperty* property : group->getProperties()) {
         if (property->isHidden() && !d->showHidden)
+            continue;
+        if (!d->filter.isEmpty() && !property->getLabel().contains(d->filter, Qt::CaseInsensitive))
             continue;
         if (!widgetGroup)
             widgetGroup = getGroup(path, true);

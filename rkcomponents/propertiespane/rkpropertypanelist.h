@@ -34,6 +34,8 @@ public:
     void setShowFavorites(bool on);
     void setShowAllGroups(bool on);
     void setMouseOverSliders(bool on);
+    // Non-empty: the node groups list only the properties whose label holds the text (any case).
+    void setFilter(const QString& text);
 
     // Filling, after clear(): true when a group of the tree got a widget.
     bool addPropertyGroups(RkPropertyGroupTree* tree, bool showHidden);

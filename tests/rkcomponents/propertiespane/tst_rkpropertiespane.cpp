@@ -18,7 +18,9 @@
 #include "widgets/rkwidgetgroup.h"
 
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenu>
+#include <QScrollBar>
 #include <QSettings>
 #include <QTemporaryDir>
 
@@ -108,6 +110,7 @@ private Q_SLOTS:
     void settingsRoundTrip();
     void optionsMenuListsHostActions();
     void favoritesActionOutlivesThePane();
+    void filterListsMatchingProperties();
 
 private:
     RkPropertiesPane* pane() const;
@@ -424,6 +427,34 @@ void TestRkPropertiesPane::favoritesActionOutlivesThePane()
                                        "RkFavoritesPropAction::executeAction()");
     action.executeAction();
     m_window = rkMakeTestMainWindow();
+}
+
+void TestRkPropertiesPane::filterListsMatchingProperties()
+{
+    rkScene->selectNode(m_bone);
+    QCoreApplication::processEvents();
+    RkPropertyPaneList* list = pane()->getPropertiesList();
+    m_window->resize(1024, 400);
+    QTest::qWait(50);
+    QScrollBar* scroll = list->verticalScrollBar();
+    QVERIFY(scroll->maximum() > 0);
+    scroll->setValue(scroll->maximum());
+    const int remembered = scroll->value();
+    RkProperty* xRotate = m_bone->findProperty(QStringLiteral("XRotate"));
+    RkProperty* yRotate = m_bone->findProperty(QStringLiteral("YRotate"));
+
+    auto* field = pane()->findChild<QLineEdit*>(QStringLiteral("FilterField"));
+    QTest::keyClicks(field, QStringLiteral("x rOT"));
+    QCoreApplication::processEvents();
+    QVERIFY(widgetOf(list, xRotate));
+    QVERIFY(!widgetOf(list, yRotate));
+    QVERIFY(list->getGroup(QStringLiteral("Transforms"), false));
+    QCOMPARE(scroll->value(), 0);
+
+    field->clear();
+    QTest::qWait(50);
+    QVERIFY(widgetOf(list, yRotate));
+    QCOMPARE(scroll->value(), remembered);
 }
 
 RK_TEST_MAIN(TestRkPropertiesPane)
