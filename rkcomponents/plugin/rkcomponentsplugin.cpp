@@ -5,8 +5,16 @@
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
+#include "rkfavoritesaddaction.h"
+#include "rkfavoritesremoveaction.h"
 #include "rkfullscreenaction.h"
 #include "rkfullscreenactionfactory.h"
+#include "rkglobalfavoritesaddaction.h"
+#include "rkglobalfavoritesremoveaction.h"
+#include "rkmouseoverslideraction.h"
+#include "rkpropertiespane.h"
+#include "rkpropertiespaneaction.h"
+#include "rkshowhiddenpropaction.h"
 #include "rktclassfactory.h"
 #include "rktoolpane.h"
 #include "rktoolpaneaction.h"
@@ -53,9 +61,17 @@ ComponentsPlugin s_plugin;
 
 RK_NAMED_FACTORY(RkToolPane, "56C51F21-B8D3-4895-9E00-6C8975018A22")
 RK_NAMED_FACTORY(RkToolPaneAction, "255648F4-B646-4dec-B18C-A5FDB71B8C61")
+RK_NAMED_FACTORY(RkPropertiesPane, "48B0C8BC-C2BB-4dcd-9D1F-C9B00FCB3198")
+RK_NAMED_FACTORY(RkPropertiesPaneAction, "BBC2D2EB-CA2F-45d2-B7F2-CA06A7ECE1BD")
+RK_NAMED_FACTORY(RkShowHiddenPropAction, "3239CB73-3DF6-4051-B2E3-FEA43957DC4A")
 
 RK_NAMED_FACTORY(RkUVView, "FF850F0D-617B-4717-93BF-7CF68542C829")
 RK_NAMED_FACTORY(RkUVViewAction, "98DD6C5E-D2CF-4dc1-B5D2-D2EBE73D274B")
+RK_NAMED_FACTORY(RkFavoritesRemoveAction, "CB35947A-1569-4181-B5C8-2B78A73A013A")
+RK_NAMED_FACTORY(RkFavoritesAddAction, "AAADFD59-6680-47d6-95B9-C99FA19688D8")
+RK_NAMED_FACTORY(RkMouseOverSliderAction, "01eaf994-480e-49db-92cb-12676a2bc3c7")
+RK_NAMED_FACTORY(RkGlobalFavoritesRemoveAction, "49DB83F8-4E8D-4ea2-AFCF-00EE915F50FB")
+RK_NAMED_FACTORY(RkGlobalFavoritesAddAction, "81652106-201A-46f8-947D-81822E612BC8")
 
 RK_NAMED_FACTORY(RkEzMixers, "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixer, "19054e20-bdb2-11de-a0a6-0002a5d5c51b")

@@ -175,6 +175,7 @@ struct RkPropertyPaneList::Private {
     QList<QPointer<RkProperty>> figureFavorites;
     bool showFavorites = true;
     bool showAllGroups = true;
+    QString filter;
 
     RkListViewState* findViewState(const RkNode* node) const
     {
@@ -226,6 +227,11 @@ void RkPropertyPaneList::setShowFavorites(bool on)
 void RkPropertyPaneList::setShowAllGroups(bool on)
 {
     d->showAllGroups = on;
+}
+
+void RkPropertyPaneList::setFilter(const QString& text)
+{
+    d->filter = text;
 }
 
 void RkPropertyPaneList::setMouseOverSliders(bool on)
@@ -415,6 +421,8 @@ bool RkPropertyPaneList::addGroupProperties(RkPropertyGroup* group)
     RkWidgetGroup* widgetGroup = nullptr;
     for (RkProperty* property : group->getProperties()) {
         if (property->isHidden() && !d->showHidden)
+            continue;
+        if (!d->filter.isEmpty() && !property->getLabel().contains(d->filter, Qt::CaseInsensitive))
             continue;
         if (!widgetGroup)
             widgetGroup = getGroup(path, true);
@@ -626,6 +634,84 @@ bool RkPropertyPaneList::rightClicked() const
 void RkPropertyPaneList::clearRightClicked()
 {
     d->rightClicked = false;
+}
+
+// Favourites.
+
+bool RkPropertyPaneList::visitWidgets(
+    RkWidgetGroup* group, const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const
+{
+    QListIterator<RkWidgetGroup*> groups = group->groupListIterator();
+    while (groups.hasNext()) {
+        RkWidgetGroup* child = groups.next();
+        if (child->isActive() && visitWidgets(child, visit))
+            return true;
+    }
+    QListIterator<QWidget*> widgets = group->widgetListIterator();
+    while (widgets.hasNext()) {
+        if (visit(group, widgets.next()))
+            return true;
+    }
+    return false;
+}
+
+bool RkPropertyPaneList::visitWidgets(
+    const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const
+{
+    for (RkWidgetGroup* group : qAsConst(d->groups)) {
+        if (group->isActive() && visitWidgets(group, visit))
+            return true;
+    }
+    return false;
+}
+
+void RkPropertyPaneList::setSelectedFlag(bool global, bool on)
+{
+    visitWidgets([&](RkWidgetGroup* group, QWidget* widget) {
+        auto* propertyWidget = qobject_cast<RkPropertyWgt*>(widget);
+        if (!propertyWidget || !propertyWidget->isSelected())
+            return false;
+        select(propertyWidget, false);
+        // A widget shared by several nodes carries each node's property.
+        for (RkProperty* property : propertyWidget->getProperties()) {
+            if (global)
+                property->setIsGlobalFavorite(on);
+            else
+                property->setIsFavorite(on);
+        }
+        // The figure favourite is gone from this group: hide it until the posted rebuild.
+        if (global && !on)
+            group->setActive(false);
+        return false;
+    });
+}
+
+void RkPropertyPaneList::setSelectedFavorite(bool on)
+{
+    setSelectedFlag(false, on);
+}
+
+void RkPropertyPaneList::setSelectedGlobalFavorite(bool on)
+{
+    setSelectedFlag(true, on);
+}
+
+void RkPropertyPaneList::scanSelection(bool& anyFigure, bool& anyLocal, bool& anyNone) const
+{
+    visitWidgets([&](RkWidgetGroup*, QWidget* widget) {
+        auto* propertyWidget = qobject_cast<RkPropertyWgt*>(widget);
+        RkProperty* property = propertyWidget ? propertyWidget->getFirstProperty() : nullptr;
+        // Clicks select the widget, not its property: either counts as selected.
+        if (property && (propertyWidget->isSelected() || property->isSelected())) {
+            if (property->isGlobalFavorite())
+                anyFigure = true;
+            if (property->isFavorite())
+                anyLocal = true;
+            if (!property->isGlobalFavorite() && !property->isFavorite())
+                anyNone = true;
+        }
+        return anyFigure && anyLocal && anyNone;
+    });
 }
 
 // Remembered view state.

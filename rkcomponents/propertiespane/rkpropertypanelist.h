@@ -2,6 +2,7 @@
 
 #include <QScrollArea>
 
+#include <functional>
 #include <memory>
 
 class RkNode;
@@ -33,6 +34,8 @@ public:
     void setShowFavorites(bool on);
     void setShowAllGroups(bool on);
     void setMouseOverSliders(bool on);
+    // Non-empty: the node groups list only the properties whose label holds the text (any case).
+    void setFilter(const QString& text);
 
     // Filling, after clear(): true when a group of the tree got a widget.
     bool addPropertyGroups(RkPropertyGroupTree* tree, bool showHidden);
@@ -47,6 +50,14 @@ public:
     // A right press reached a property widget of this list since the flag was last cleared.
     bool rightClicked() const;
     void clearRightClicked();
+
+    // Favourite flags of the selected widgets' properties; the widgets are deselected. Removing
+    // figure favourites deactivates the groups that held them until the next rebuild.
+    void setSelectedFavorite(bool on);
+    void setSelectedGlobalFavorite(bool on);
+    // Sets (never clears) anyFigure, anyLocal and anyNone from the selected widgets' first
+    // properties, so calls on two lists add up.
+    void scanSelection(bool& anyFigure, bool& anyLocal, bool& anyNone) const;
 
     // Around a rebuild: save before clear(), restore after the list was filled.
     void saveViewState();
@@ -76,6 +87,11 @@ private:
     bool moveGroupToEnd(RkWidgetGroup* group);
     void select(RkPropertyWgt* widget, bool on);
     void selectRange(RkPropertyWgt* a, RkPropertyWgt* b);
+    // Calls visit for each widget of the active groups, sub-groups first, until it returns true.
+    bool visitWidgets(RkWidgetGroup* group,
+                      const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const;
+    bool visitWidgets(const std::function<bool(RkWidgetGroup*, QWidget*)>& visit) const;
+    void setSelectedFlag(bool global, bool on);
     bool selectRangeIn(RkWidgetGroup* group, RkPropertyWgt* a, RkPropertyWgt* b, bool& inRange);
 
     struct Private;

@@ -133,12 +133,23 @@ void TestRkComponentsModule::factoryTableOrder()
         ++row;
     }
     // The classes the module has so far; a class added to the module is added here too.
-    const QStringList built = {
-        QStringLiteral("RkToolPane"),        QStringLiteral("RkToolPaneAction"),
-        QStringLiteral("RkUVView"),          QStringLiteral("RkUVViewAction"),
-        QStringLiteral("RkEzMixers"),        QStringLiteral("RkEzMixer"),
-        QStringLiteral("RkEzMixerControl"),  QStringLiteral("RkEzMixerDriver"),
-        QStringLiteral("RkFullScreenAction")};
+    const QStringList built = {QStringLiteral("RkToolPane"),
+                               QStringLiteral("RkToolPaneAction"),
+                               QStringLiteral("RkPropertiesPane"),
+                               QStringLiteral("RkPropertiesPaneAction"),
+                               QStringLiteral("RkShowHiddenPropAction"),
+                               QStringLiteral("RkUVView"),
+                               QStringLiteral("RkUVViewAction"),
+                               QStringLiteral("RkFavoritesRemoveAction"),
+                               QStringLiteral("RkFavoritesAddAction"),
+                               QStringLiteral("RkMouseOverSliderAction"),
+                               QStringLiteral("RkGlobalFavoritesRemoveAction"),
+                               QStringLiteral("RkGlobalFavoritesAddAction"),
+                               QStringLiteral("RkEzMixers"),
+                               QStringLiteral("RkEzMixer"),
+                               QStringLiteral("RkEzMixerControl"),
+                               QStringLiteral("RkEzMixerDriver"),
+                               QStringLiteral("RkFullScreenAction")};
     QCOMPARE(seen, built);
 }
 
