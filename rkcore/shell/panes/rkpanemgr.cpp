@@ -172,8 +172,11 @@ QDockWidget* RkPaneMgr::dockPane(RkPane* pane)
     dock->setWidget(pane);
     dock->setTitleBarWidget(makeTitleBar(dock, pane));
     d->mainWindow->addDockWidget(Qt::RightDockWidgetArea, dock);
-    if (firstDock)
+    // Panes share one tabbed dock; the first one docked stays the tab in front.
+    if (firstDock) {
         d->mainWindow->tabifyDockWidget(firstDock, dock);
+        firstDock->raise();
+    }
     connect(dock->toggleViewAction(), &QAction::toggled, this,
             [this, className](bool visible) { Q_EMIT paneVisibilityChanged(className, visible); });
     return dock;
