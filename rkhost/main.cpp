@@ -317,6 +317,13 @@ int main(int argc, char** argv)
     // The docks on the left keep room for names, whatever the view in the middle asks for.
     if (auto* sceneDock = window.findChild<QDockWidget*>(QStringLiteral("SceneDock")))
         window.resizeDocks({sceneDock}, {250}, Qt::Horizontal);
+    const auto docks = window.findChildren<QDockWidget*>();
+    for (QDockWidget* dock : docks) {
+        if (window.dockWidgetArea(dock) == Qt::RightDockWidgetArea) {
+            window.resizeDocks({dock}, {300}, Qt::Horizontal);
+            break;
+        }
+    }
     window.show();
     if (!parser.positionalArguments().isEmpty() &&
         !openStartScene(parser.positionalArguments().constFirst(), sceneMenus,
