@@ -5,6 +5,8 @@
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
+#include "rkezpropertiespane.h"
+#include "rkezpropertiespaneaction.h"
 #include "rkfullscreenaction.h"
 #include "rkfullscreenactionfactory.h"
 #include "rktclassfactory.h"
@@ -57,6 +59,8 @@ RK_NAMED_FACTORY(RkToolPaneAction, "255648F4-B646-4dec-B18C-A5FDB71B8C61")
 RK_NAMED_FACTORY(RkUVView, "FF850F0D-617B-4717-93BF-7CF68542C829")
 RK_NAMED_FACTORY(RkUVViewAction, "98DD6C5E-D2CF-4dc1-B5D2-D2EBE73D274B")
 
+RK_NAMED_FACTORY(RkEzPropertiesPane, "40e0b500-9711-11de-aed8-0002a5d5c51b")
+RK_NAMED_FACTORY(RkEzPropertiesPaneAction, "55b5a760-9711-11de-b0b1-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixers, "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixer, "19054e20-bdb2-11de-a0a6-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixerControl, "1f6c1960-bdb2-11de-af02-0002a5d5c51b")

@@ -148,10 +148,11 @@ void TestRkComponentsModule::factoryTableOrder()
     }
     // The classes the module has so far; a class added to the module is added here too.
     const QStringList built = {
-        QStringLiteral("RkToolPane"),        QStringLiteral("RkToolPaneAction"),
-        QStringLiteral("RkUVView"),          QStringLiteral("RkUVViewAction"),
-        QStringLiteral("RkEzMixers"),        QStringLiteral("RkEzMixer"),
-        QStringLiteral("RkEzMixerControl"),  QStringLiteral("RkEzMixerDriver"),
+        QStringLiteral("RkToolPane"),         QStringLiteral("RkToolPaneAction"),
+        QStringLiteral("RkUVView"),           QStringLiteral("RkUVViewAction"),
+        QStringLiteral("RkEzPropertiesPane"), QStringLiteral("RkEzPropertiesPaneAction"),
+        QStringLiteral("RkEzMixers"),         QStringLiteral("RkEzMixer"),
+        QStringLiteral("RkEzMixerControl"),   QStringLiteral("RkEzMixerDriver"),
         QStringLiteral("RkFullScreenAction")};
     QCOMPARE(seen, built);
 }
