@@ -24,6 +24,7 @@
 #include "undo/rkundostack.h"
 
 #include <QComboBox>
+#include <QFile>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
@@ -33,6 +34,7 @@
 #include <QStackedLayout>
 #include <QStandardItemModel>
 #include <QTemporaryDir>
+#include <QtEndian>
 
 namespace
 {
@@ -90,6 +92,70 @@ private:
 alignas(std::max_align_t) unsigned char SameSpotFigure::s_spot[sizeof(RkSkeleton) + 64];
 bool SameSpotFigure::s_taken = false;
 
+// One record of a scene file: class name, the raw bytes after its length, and per section its id
+// and the tags of its values in order.
+struct StoredRecord {
+    QString className;
+    QByteArray bytes;
+    QVector<QPair<int, QByteArray>> sections;
+};
+
+template <typename T> T takeLE(const QByteArray& data, int& pos)
+{
+    const T value = qFromLittleEndian<T>(data.constData() + pos);
+    pos += int(sizeof(T));
+    return value;
+}
+
+QString takeString(const QByteArray& data, int& pos)
+{
+    const int n = int(takeLE<quint32>(data, pos));
+    const QString s = QString::fromUtf8(data.mid(pos, n));
+    pos += n;
+    return s;
+}
+
+QVector<StoredRecord> readRecords(const QByteArray& file)
+{
+    QVector<StoredRecord> records;
+    int pos = 24;
+    while (pos + 4 <= file.size()) {
+        const int length = int(takeLE<quint32>(file, pos));
+        StoredRecord record;
+        record.bytes = file.mid(pos, length);
+        const int end = pos + length;
+        takeString(file, pos);
+        record.className = takeString(file, pos);
+        takeString(file, pos);
+        const int sections = int(takeLE<quint32>(file, pos));
+        for (int k = 0; k < sections; ++k) {
+            const int id = takeLE<quint16>(file, pos);
+            const int payloadEnd = int(takeLE<quint32>(file, pos)) + pos;
+            QByteArray tags;
+            while (pos < payloadEnd) {
+                const char tag = file.at(pos++);
+                tags.append(tag);
+                if (tag == 1 || tag == 2)
+                    pos += 4;
+                else if (tag == 3)
+                    pos += 8;
+                else if (tag == 4)
+                    pos += 1;
+                else if (tag == 5 || tag == 6)
+                    pos += int(takeLE<quint32>(file, pos));
+                else if (tag == 7 && file.at(pos) == 2)
+                    pos += 7, takeString(file, pos);
+                else if (tag == 7)
+                    pos += 7;
+            }
+            record.sections.append({id, tags});
+        }
+        pos = end;
+        records.append(record);
+    }
+    return records;
+}
+
 } // namespace
 
 class TestRkEzPropertiesPane : public QObject
@@ -108,6 +174,7 @@ private Q_SLOTS:
     void deleteFromAStaleMenuDoesNothing();
     void filterFindsMorphsByLabel();
     void switchingCategoriesLeavesNoWidgets();
+    void storedMixerForm();
 
 private:
     RkEzPropertiesWgt* wgt() const { return m_pane->getPropertiesWgt(); }
@@ -445,6 +512,62 @@ void TestRkEzPropertiesPane::switchingCategoriesLeavesNoWidgets()
     }
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     QCOMPARE(m_pane->findChildren<QWidget*>().size(), widgets);
+}
+
+void TestRkEzPropertiesPane::storedMixerForm()
+{
+    choose(0, QStringLiteral("Morphs"));
+    const QVector<RkEzPropertiesControl*> tiles =
+        wgt()->getCurrentPage()->getIconGrid()->getTiles();
+    QVERIFY(tiles.size() >= 2);
+    drop(tiles[0]);
+    drop(tiles[1]);
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("mixers.rks"));
+    QVERIFY(rkScene->save(path));
+    QFile file(path);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    const QVector<StoredRecord> records = readRecords(file.readAll());
+
+    auto indexOf = [&](const char* className) {
+        for (int i = 0; i < records.size(); ++i) {
+            if (records[i].className == QLatin1String(className))
+                return i;
+        }
+        return -1;
+    };
+    const int mixersAt = indexOf("RkEzMixers");
+    const int mixerAt = indexOf("RkEzMixer");
+    QVERIFY(mixersAt >= 0 && mixerAt >= 0);
+
+    // The mixer list: guid, class, name, one section 0x210 holding one object pointer (kind 1,
+    // index 0, the mixer's record).
+    QByteArray expected = QByteArray::fromHex(
+        "24000000 65623362383065302d626462312d313164652d393862302d303030326135643563353162"
+        "0a000000 526b457a4d6978657273 0a000000 526b457a4d6978657273 01000000"
+        "1002 08000000 07 01 0000");
+    char target[4];
+    qToLittleEndian<qint32>(mixerAt, target);
+    expected.append(target, 4);
+    QCOMPARE(records[mixersAt].bytes.toHex(), expected.toHex());
+
+    // The others: section ids and value tags in their order.
+    using Sections = QVector<QPair<int, QByteArray>>;
+    const QByteArray P("\x07", 1), F("\x02", 1), I("\x01", 1), B("\x06", 1);
+    QCOMPARE(records[mixerAt].sections, Sections({{0x220, P + P}, {0x230, P}}));
+    int controls = 0;
+    int drivers = 0;
+    for (const StoredRecord& record : records) {
+        if (record.className == QLatin1String("RkEzMixerControl")) {
+            ++controls;
+            QCOMPARE(record.sections, Sections({{0x222, B}, {0x221, P + F}, {0x223, I + I}}));
+        } else if (record.className == QLatin1String("RkEzMixerDriver")) {
+            ++drivers;
+            QCOMPARE(record.sections, Sections({{0x231, I + I}}));
+        }
+    }
+    QCOMPARE(controls, 2);
+    QCOMPARE(drivers, 1);
 }
 
 RK_TEST_MAIN(TestRkEzPropertiesPane)
