@@ -94,6 +94,8 @@ struct RkEzPropertiesWgt::Private {
     RkEzTabBar* lowerTabs = nullptr;
     // The mixer page whose tab opened the context menu; a rebuild meanwhile may take it.
     QPointer<RkEzMixerWgt> menuPage;
+    // One menu for every mixer tab, made when first wanted.
+    QMenu* tabMenu = nullptr;
     RkEzPropertiesPage* firstPage = nullptr;
     QVector<RkEzPropertiesPage*> pages;
     QVector<RkEzMixerWgt*> mixerPages;
@@ -501,10 +503,11 @@ void RkEzPropertiesWgt::lowerTabContextMenu(const QPoint& pos)
         return;
     d->lowerTabs->setCurrentIndex(t);
     d->menuPage = d->mixerPages[t];
-    auto* menu = new QMenu(this);
-    menu->setAttribute(Qt::WA_DeleteOnClose);
-    menu->addAction(QStringLiteral("Delete"), this, &RkEzPropertiesWgt::lowerTabRemove);
-    menu->popup(QCursor::pos());
+    if (!d->tabMenu) {
+        d->tabMenu = new QMenu(this);
+        d->tabMenu->addAction(QStringLiteral("Delete"), this, &RkEzPropertiesWgt::lowerTabRemove);
+    }
+    d->tabMenu->popup(QCursor::pos());
 }
 
 void RkEzPropertiesWgt::lowerTabRemove()
