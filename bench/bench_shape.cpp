@@ -1,6 +1,7 @@
 // The Shape tab's icon grid: BM_MixDrag/N times one mouse move of the mixing handle during a drag
 // over N tiles (up to the eight of a page), each tile's morph written and recorded for undo;
-// BM_ThumbnailPage times the eight thumbnails of a page made through the grid's own timer.
+// BM_ThumbnailPage times the eight thumbnails of a page made through the grid's own timer;
+// BM_SelectFigure/N times the Shape tab taking up a newly selected figure of N morphs.
 #include "app/rkmainwindow.h"
 #include "demo/rkdemoscene.h"
 #include "properties/rkfloatproperty.h"
@@ -9,11 +10,16 @@
 #include "rkezicongridwgt.h"
 #include "rkezpropertiescontrol.h"
 #include "rkezpropertiesdragger.h"
+#include "rkezpropertiespage.h"
+#include "rkezpropertiespane.h"
+#include "rkezpropertieswgt.h"
 #include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
 
+#include <QElapsedTimer>
 #include <QMouseEvent>
+#include <QStandardItemModel>
 #include <QTimer>
 #include <QWidget>
 
@@ -123,5 +129,55 @@ static void BM_ThumbnailPage(benchmark::State& state)
     rkScene->clear();
 }
 BENCHMARK(BM_ThumbnailPage)->Unit(benchmark::kMillisecond)->UseRealTime();
+
+// From the selection of a figure of N morphs in 25 categories to its first page of tiles: the
+// 20 ms selection timer, the category tree, the chooser's first level and the pages of the
+// categories at the top.
+static void BM_SelectFigure(benchmark::State& state)
+{
+    const int n = int(state.range(0));
+    rkScene->clear();
+    RkEzPropertiesPane pane;
+    pane.resize(420, 760);
+    pane.show();
+    // The tab starts quiet until the scene is first cleared.
+    rkScene->clear();
+    auto* figure = new RkSkeleton;
+    for (int i = 0; i < n; ++i) {
+        const QString name = QString("Morph %1").arg(i);
+        figure->addProperty(new RkFloatProperty(name, name), QString("Category %1").arg(i % 25));
+    }
+    rkScene->addNode(figure);
+    RkEzPropertiesWgt* wgt = pane.getPropertiesWgt();
+    auto settle = [&](bool selected) {
+        QElapsedTimer clock;
+        clock.start();
+        while (clock.elapsed() < 5000) {
+            QCoreApplication::processEvents();
+            RkEzPropertiesPage* page = wgt->getCurrentPage();
+            const bool shown = page && !page->getProperties().isEmpty();
+            if (shown == selected && (wgt->getCategoryModel()->rowCount() > 0) == selected)
+                return true;
+        }
+        return false;
+    };
+    for (auto _ : state) {
+        state.PauseTiming();
+        rkScene->clearSelection();
+        if (!settle(false)) {
+            state.SkipWithError("the pane did not empty");
+            break;
+        }
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+        state.ResumeTiming();
+        rkScene->selectNode(figure);
+        if (!settle(true)) {
+            state.SkipWithError("no page was built");
+            break;
+        }
+    }
+    rkScene->clear();
+}
+BENCHMARK(BM_SelectFigure)->Arg(500)->Unit(benchmark::kMillisecond)->UseRealTime();
 
 RK_BENCHMARK_MAIN(true)

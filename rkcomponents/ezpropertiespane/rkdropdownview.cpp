@@ -63,8 +63,11 @@ void RkDropDownView::buildLevel(int itemIndex, int choiceRow, QString placeholde
 {
     // Dropped levels are hidden now, so the layout and the height no longer count them.
     for (int k = items.count() - 1; k > itemIndex; --k) {
-        if (items[k]->combo)
+        // The box goes in the same pass as its level, not one pass after it.
+        if (items[k]->combo) {
             items[k]->combo->hide();
+            items[k]->combo->deleteLater();
+        }
         items[k]->deleteLater();
     }
     items.resize(std::max(itemIndex + 1, 0));

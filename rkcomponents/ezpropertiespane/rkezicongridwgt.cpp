@@ -2,11 +2,13 @@
 
 #include "app/rkapp.h"
 #include "app/rkmainwindow.h"
+#include "cdropbutton.h"
 #include "properties/rkfloatproperty.h"
 #include "render/rk3dviewport.h"
 #include "rkezimagerenderhandler.h"
 #include "rkezpropertiescontrol.h"
 #include "rkezpropertiesdragger.h"
+#include "rkezpropertiespage.h"
 #include "rksourcewarning.h"
 #include "scene/rkscene.h"
 #include "undo/rkundostack.h"
@@ -61,6 +63,7 @@ RkEzIconGridWgt::RkEzIconGridWgt(QWidget* parent, RkEzPropertiesPage* page)
         d->grid->setRowStretch(i, 100);
     }
     layout->addLayout(d->grid, 0);
+    layout->addWidget(new CDropButton(this, page ? page->getOwner() : nullptr), 0, Qt::AlignBottom);
 
     d->timer->setInterval(0);
     connect(d->timer, &QTimer::timeout, this, &RkEzIconGridWgt::makeImageTimeout);
@@ -106,7 +109,7 @@ void RkEzIconGridWgt::setFirst(int first)
 
 int RkEzIconGridWgt::getFirst() const
 {
-    return d->first;
+    return d->page ? d->page->getFirst() : d->first;
 }
 
 void RkEzIconGridWgt::snapshotTileValues()
@@ -188,7 +191,8 @@ void RkEzIconGridWgt::addProperties(QVector<RkProperty*> properties)
         return;
     if (d->dragger || !d->tiles.isEmpty() || !d->spacers.isEmpty())
         clear();
-    int idx = d->first;
+    // A page's grid shows the page's current eight; a grid on its own keeps its own index.
+    int idx = d->page ? d->page->getFirst() : d->first;
     for (int cell = 0; cell < 9; ++cell) {
         if (cell == 4)
             continue;

@@ -33,7 +33,8 @@ public:
     // The thumbnail timer, for tests and benchmarks that watch or drive the making.
     QTimer* getTimer() const;
 
-    // The index in the set of the first tile; addProperties() starts there.
+    // The index in the set of the first tile; addProperties() starts there. A grid on a page
+    // follows the page's index; setFirst() serves a grid on its own.
     void setFirst(int first);
     int getFirst() const;
 

@@ -5,6 +5,8 @@
 #include "rkezmixercontrol.h"
 #include "rkezmixerdriver.h"
 #include "rkezmixers.h"
+#include "rkezpropertiespane.h"
+#include "rkezpropertiespaneaction.h"
 #include "rkfavoritesaddaction.h"
 #include "rkfavoritesremoveaction.h"
 #include "rkfullscreenaction.h"
@@ -73,6 +75,8 @@ RK_NAMED_FACTORY(RkMouseOverSliderAction, "01eaf994-480e-49db-92cb-12676a2bc3c7"
 RK_NAMED_FACTORY(RkGlobalFavoritesRemoveAction, "49DB83F8-4E8D-4ea2-AFCF-00EE915F50FB")
 RK_NAMED_FACTORY(RkGlobalFavoritesAddAction, "81652106-201A-46f8-947D-81822E612BC8")
 
+RK_NAMED_FACTORY(RkEzPropertiesPane, "40e0b500-9711-11de-aed8-0002a5d5c51b")
+RK_NAMED_FACTORY(RkEzPropertiesPaneAction, "55b5a760-9711-11de-b0b1-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixers, "eb3b80e0-bdb1-11de-98b0-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixer, "19054e20-bdb2-11de-a0a6-0002a5d5c51b")
 RK_NAMED_FACTORY(RkEzMixerControl, "1f6c1960-bdb2-11de-af02-0002a5d5c51b")

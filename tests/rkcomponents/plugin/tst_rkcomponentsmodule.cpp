@@ -145,6 +145,8 @@ void TestRkComponentsModule::factoryTableOrder()
                                QStringLiteral("RkMouseOverSliderAction"),
                                QStringLiteral("RkGlobalFavoritesRemoveAction"),
                                QStringLiteral("RkGlobalFavoritesAddAction"),
+                               QStringLiteral("RkEzPropertiesPane"),
+                               QStringLiteral("RkEzPropertiesPaneAction"),
                                QStringLiteral("RkEzMixers"),
                                QStringLiteral("RkEzMixer"),
                                QStringLiteral("RkEzMixerControl"),
