@@ -296,13 +296,16 @@ int main(int argc, char** argv)
     rkAddSceneList(&window);
     rkAddSurfaceList(&window);
     rkAddPropertiesDock(&window);
-    rkBuildDemoScene(rkScene);
     rkAddHostActions(&window);
     rkAddPoseActions(&window);
     rkAddDemoTools(window.getViewportMgr(), window.getActionMgr());
 
     core.getPluginMgr()->loadModules(folder);
     window.getPaneMgr()->createPanes();
+    // The demo scene comes as a new scene does: the panes, made by now, see the scene cleared and
+    // then its content added, as after File > New.
+    rkScene->clear();
+    rkBuildDemoScene(rkScene);
     // Scripts reach the window's widgets by object name: mainWindow.findChild("RkToolPaneDock").
     QScriptEngine* engine = core.getScriptEngine();
     engine->globalObject().setProperty(QStringLiteral("mainWindow"), engine->newQObject(&window));
