@@ -130,7 +130,8 @@ RkEzPropertiesWgt::RkEzPropertiesWgt(QWidget* parent)
     chooser->addWidget(d->categoryView, 0);
     d->filterEdit = new QLineEdit(this);
     d->filterEdit->setPlaceholderText(QStringLiteral("Filter morphs"));
-    d->filterEdit->setClearButtonEnabled(true);
+    // No clear button: its fade animation leaks when the field goes while it runs.
+    d->filterEdit->setClearButtonEnabled(false);
     chooser->addWidget(d->filterEdit, 0, Qt::AlignTop);
     layout->addLayout(chooser, 0);
 

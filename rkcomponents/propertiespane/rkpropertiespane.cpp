@@ -96,7 +96,8 @@ RkPropertiesPane::RkPropertiesPane() : RkPane(tr("Parameters")), d(std::make_uni
     d->filterField = new QLineEdit(this);
     d->filterField->setObjectName(QStringLiteral("FilterField"));
     d->filterField->setPlaceholderText(tr("Filter parameters"));
-    d->filterField->setClearButtonEnabled(true);
+    // No clear button: its fade animation leaks when the field goes while it runs.
+    d->filterField->setClearButtonEnabled(false);
     connect(d->filterField, &QLineEdit::textChanged, this, &RkPropertiesPane::needRefresh);
 
     d->propertiesList = new RkPropertyPaneList(this, QStringLiteral("PropertiesList"));
