@@ -20,6 +20,7 @@
 #include "rkezpropertieswgt.h"
 #include "rkeztabbar.h"
 #include "rktestmain.h"
+#include "scene/rkbone.h"
 #include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
@@ -171,6 +172,7 @@ private Q_SLOTS:
     void categoriesSkipGeneralAndDeformers();
     void pagingTexts();
     void droppedTilesFillMixers();
+    void bonesShowTheirFiguresMixers();
     void figureLeavingTheSceneRebuilds();
     void newNodeAtTheSameAddressRebuilds();
     void deleteFromAStaleMenuDoesNothing();
@@ -393,6 +395,24 @@ void TestRkEzPropertiesPane::droppedTilesFillMixers()
              QPoint(105, 42));
     QCOMPARE(QPoint(mixer->getControls()[1]->getX(), mixer->getControls()[1]->getY()),
              QPoint(168, 127));
+}
+
+void TestRkEzPropertiesPane::bonesShowTheirFiguresMixers()
+{
+    drop(wgt()->getCurrentPage()->getIconGrid()->getTiles().value(0));
+    QPointer<RkEzMixerWgt> page = wgt()->getMixerPages().value(0);
+    QVERIFY(page);
+    for (RkBone* bone : {m_figure->findBone("chest"), m_figure->findBone("neck")}) {
+        QVERIFY(bone);
+        const int before = wgt()->getRebuildCount();
+        rkScene->selectNode(bone);
+        QTRY_COMPARE(wgt()->getRebuildCount(), before + 1);
+        // Same figure: the mixer pages stay as they were.
+        QCOMPARE(wgt()->getMixerPages().value(0), page.data());
+        QCOMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"Mixer 1", "+"}));
+    }
+    rkScene->selectNode(rkScene->findNode(QLatin1String(RkDemoPropName)));
+    QTRY_COMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"+"}));
 }
 
 void TestRkEzPropertiesPane::figureLeavingTheSceneRebuilds()
