@@ -192,6 +192,11 @@ void TestRkPropertiesPane::followsSelectionWithOneRebuild()
     QCoreApplication::processEvents();
     QCOMPARE(rebuilds.count, 1);
     QCOMPARE(caption(), QStringLiteral("Demo Figure : ") + m_bone->getLabel());
+    // Neither text is cut by the other, whatever the font.
+    const QLabel* captionLabel = pane()->findChildren<QLabel*>().at(0);
+    QVERIFY(captionLabel->width() >= captionLabel->sizeHint().width());
+    QVERIFY(pane()->findChildren<QLabel*>().at(1)->x() >=
+            captionLabel->x() + captionLabel->sizeHint().width());
     QVERIFY(pane()->getFavoritesList()->isVisible());
     QVERIFY(pane()->getFavoritesList()->getGroup(QStringLiteral("Figure Favorites"), false));
 
