@@ -172,7 +172,7 @@ private Q_SLOTS:
     void categoriesSkipGeneralAndDeformers();
     void pagingTexts();
     void droppedTilesFillMixers();
-    void bonesShowTheirFiguresMixers();
+    void bonesKeepMixersAndTabsReselect();
     void figureLeavingTheSceneRebuilds();
     void newNodeAtTheSameAddressRebuilds();
     void deleteFromAStaleMenuDoesNothing();
@@ -397,7 +397,7 @@ void TestRkEzPropertiesPane::droppedTilesFillMixers()
              QPoint(168, 127));
 }
 
-void TestRkEzPropertiesPane::bonesShowTheirFiguresMixers()
+void TestRkEzPropertiesPane::bonesKeepMixersAndTabsReselect()
 {
     drop(wgt()->getCurrentPage()->getIconGrid()->getTiles().value(0));
     QPointer<RkEzMixerWgt> page = wgt()->getMixerPages().value(0);
@@ -411,6 +411,20 @@ void TestRkEzPropertiesPane::bonesShowTheirFiguresMixers()
         QCOMPARE(wgt()->getMixerPages().value(0), page.data());
         QCOMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"Mixer 1", "+"}));
     }
+
+    // A click on the still drawn tab of the row that is not active shows its page again.
+    RkEzTabBar* upper = wgt()->getUpperTabs();
+    RkEzTabBar* lower = wgt()->getLowerTabs();
+    for (int round = 0; round < 2; ++round) {
+        QTest::mouseClick(lower, Qt::LeftButton, {}, lower->tabRect(0).center());
+        QTRY_VERIFY(page->isVisible());
+        QCOMPARE(upper->currentIndex(), -1);
+        QTest::mouseClick(upper, Qt::LeftButton, {}, upper->tabRect(0).center());
+        QTRY_VERIFY(wgt()->getCurrentPage()->isVisible());
+        QVERIFY(!page->isVisible());
+        QCOMPARE(lower->currentIndex(), -1);
+    }
+
     rkScene->selectNode(rkScene->findNode(QLatin1String(RkDemoPropName)));
     QTRY_COMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"+"}));
 }
