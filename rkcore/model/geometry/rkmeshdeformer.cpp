@@ -118,8 +118,7 @@ void RkMeshDeformer::applyMorphs(const float* weights, int numWeights, RkVec3* p
     }
 }
 
-void RkMeshDeformer::skin(const RkXform* bones, int numBones, RkVec3* p, int begin,
-                          int end) const
+void RkMeshDeformer::skin(const RkXform* bones, int numBones, RkVec3* p, int begin, int end) const
 {
     const RkBoneInfluence* inf = m_influences.constData() + begin * MaxInfluences;
     for (int v = begin; v < end; ++v, inf += MaxInfluences) {
@@ -157,10 +156,9 @@ void RkMeshDeformer::deform(const float* weights, int numWeights, const RkXform*
     if (!bones || numBones <= 0 || m_influences.isEmpty())
         return;
     const int n = out.size();
-    const int threads =
-        threaded && n > ThreadedVertexCount
-            ? int(std::min(4u, std::max(1u, std::thread::hardware_concurrency())))
-            : 1;
+    const int threads = threaded && n > ThreadedVertexCount
+                            ? int(std::min(4u, std::max(1u, std::thread::hardware_concurrency())))
+                            : 1;
     if (threads <= 1) {
         skin(bones, numBones, p, 0, n);
         return;

@@ -120,9 +120,7 @@ QString text(const aiString& s)
 class ProgressRelay : public Assimp::ProgressHandler
 {
 public:
-    explicit ProgressRelay(std::function<bool(float)> callback) : m_callback(std::move(callback))
-    {
-    }
+    explicit ProgressRelay(std::function<bool(float)> callback) : m_callback(std::move(callback)) {}
     bool Update(float percentage) override
     {
         // The library's own steps make up the first nine tenths; building the mesh the rest.
@@ -223,10 +221,8 @@ struct RkImporter::Private {
     void buildObject(RkNode* node);
 };
 
-
-RkImporter::Private::Material RkImporter::Private::readMaterial(const aiScene* scene,
-                                                                const aiMaterial* material,
-                                                                int index)
+RkImporter::Private::Material
+RkImporter::Private::readMaterial(const aiScene* scene, const aiMaterial* material, int index)
 {
     Material m;
     aiString name;
@@ -237,7 +233,9 @@ RkImporter::Private::Material RkImporter::Private::readMaterial(const aiScene* s
     aiColor4D c;
     if (material->Get(AI_MATKEY_COLOR_DIFFUSE, c) == AI_SUCCESS ||
         material->Get(AI_MATKEY_BASE_COLOR, c) == AI_SUCCESS) {
-        const auto channel = [](float v) { return std::isfinite(v) ? std::clamp(v, 0.0f, 1.0f) : 0.8f; };
+        const auto channel = [](float v) {
+            return std::isfinite(v) ? std::clamp(v, 0.0f, 1.0f) : 0.8f;
+        };
         m.colour = QColor::fromRgbF(channel(c.r), channel(c.g), channel(c.b));
     }
 
@@ -365,10 +363,10 @@ bool RkImporter::Private::convert(const aiScene* scene)
     QVector<bool> badVertex;
     QVector<RkPnt2> uvs;
     QHash<unsigned, int> materialSlot;
-    QSet<QString> propertyNames = {
-        QStringLiteral("XTranslate"), QStringLiteral("YTranslate"), QStringLiteral("ZTranslate"),
-        QStringLiteral("XRotate"),    QStringLiteral("YRotate"),    QStringLiteral("ZRotate"),
-        QStringLiteral("Scale"),      QStringLiteral("Visible")};
+    QSet<QString> propertyNames = {QStringLiteral("XTranslate"), QStringLiteral("YTranslate"),
+                                   QStringLiteral("ZTranslate"), QStringLiteral("XRotate"),
+                                   QStringLiteral("YRotate"),    QStringLiteral("ZRotate"),
+                                   QStringLiteral("Scale"),      QStringLiteral("Visible")};
     struct Facet {
         int corners[4];
         int size;
@@ -627,7 +625,8 @@ bool RkImporter::Private::convert(const aiScene* scene)
             upSign = sign < 0 ? -1 : 1;
         float factor = 0.0f;
         // Centimetres per unit.
-        if (meta->Get(std::string("UnitScaleFactor"), factor) && std::isfinite(factor) && factor > 0.0f)
+        if (meta->Get(std::string("UnitScaleFactor"), factor) && std::isfinite(factor) &&
+            factor > 0.0f)
             unit = double(factor) / 100.0;
     }
     const RkVec3 extent = hi - lo;
@@ -663,8 +662,8 @@ bool RkImporter::Private::convert(const aiScene* scene)
     const RkVec3 size = hi - lo;
     const float largest = std::max({size.x, size.y, size.z});
     float scale = 1.0f;
-    if (!bones.isEmpty() && (size.y < 0.3f || size.y > 3.0f) && size.y > 0.0f)
-        scale = 1.8f / size.y;
+    if (!bones.isEmpty() && (largest < 0.3f || largest > 3.0f) && largest > 0.0f)
+        scale = 1.8f / largest;
     else if (bones.isEmpty() && (largest < 0.05f || largest > 5.0f) && largest > 0.0f)
         scale = 1.0f / largest;
     if (scale != 1.0f || unit != 1.0 || upAxis != 1 || upSign != 1)
@@ -759,7 +758,8 @@ void RkImporter::Private::buildObject(RkNode* node)
         object->setSkinBones(skin);
         const int n = influences.size() / RkMeshDeformer::MaxInfluences;
         for (int v = 0; v < n; ++v) {
-            object->setVertexInfluences(v, influences.constData() + v * RkMeshDeformer::MaxInfluences,
+            object->setVertexInfluences(v,
+                                        influences.constData() + v * RkMeshDeformer::MaxInfluences,
                                         RkMeshDeformer::MaxInfluences);
         }
     }
@@ -791,10 +791,10 @@ bool RkImporter::read(const QString& path)
                                 aiPrimitiveType_POINT | aiPrimitiveType_LINE);
     // The importer owns the handler.
     importer.SetProgressHandler(new ProgressRelay([this](float f) { return d->report(f); }));
-    const aiScene* scene = importer.ReadFile(
-        QFile::encodeName(d->path).toStdString(),
-        aiProcess_JoinIdenticalVertices | aiProcess_ValidateDataStructure |
-            aiProcess_LimitBoneWeights | aiProcess_SortByPType);
+    const aiScene* scene =
+        importer.ReadFile(QFile::encodeName(d->path).toStdString(),
+                          aiProcess_JoinIdenticalVertices | aiProcess_ValidateDataStructure |
+                              aiProcess_LimitBoneWeights | aiProcess_SortByPType);
     if (d->cancelled)
         return d->fail(QStringLiteral("the import was cancelled"));
     if (!scene) {
@@ -879,9 +879,9 @@ RkNode* RkImporter::addToScene(RkScene* scene)
             bone->setLabel(b.name);
             bone->setOrigin(QVector3D(b.origin.x, b.origin.y, b.origin.z));
             bone->setNodeParent(b.parent >= 0 ? static_cast<RkNode*>(made[b.parent]) : figure);
-            for (RkFloatProperty* p : {bone->getXRotate(), bone->getYRotate(), bone->getZRotate(),
-                                       bone->getXTranslate(), bone->getYTranslate(),
-                                       bone->getZTranslate()})
+            for (RkFloatProperty* p :
+                 {bone->getXRotate(), bone->getYRotate(), bone->getZRotate(), bone->getXTranslate(),
+                  bone->getYTranslate(), bone->getZTranslate()})
                 bone->getPropertyGroups()->addProperty(p, QStringLiteral("Pose"));
             scene->addNode(bone);
             made.append(bone);
@@ -907,7 +907,8 @@ QStringList RkImporter::filePatterns()
     std::string list;
     Assimp::Importer().GetExtensionList(list);
     QStringList patterns;
-    for (const QString& p : QString::fromStdString(list).split(QLatin1Char(';'), Qt::SkipEmptyParts))
+    for (const QString& p :
+         QString::fromStdString(list).split(QLatin1Char(';'), Qt::SkipEmptyParts))
         patterns.append(p.trimmed());
     return patterns;
 }

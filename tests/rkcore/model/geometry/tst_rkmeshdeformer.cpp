@@ -124,8 +124,8 @@ void TestRkMeshDeformer::blendedInfluences()
     const RkBoneInfluence quarter[2] = {{0, 0.5f}, {1, 1.5f}};
     QCOMPARE(d.setVertexInfluences(0, quarter, 2), 2);
     // Five influences: the lightest goes, as do a negative bone, a NaN and a negative weight.
-    const RkBoneInfluence many[8] = {{0, 0.1f}, {1, 0.2f}, {2, 0.3f}, {3, 0.2f},
-                                     {0, 0.05f}, {-1, 5.0f}, {2, nan}, {1, -3.0f}};
+    const RkBoneInfluence many[8] = {{0, 0.1f},  {1, 0.2f},  {2, 0.3f}, {3, 0.2f},
+                                     {0, 0.05f}, {-1, 5.0f}, {2, nan},  {1, -3.0f}};
     QCOMPARE(d.setVertexInfluences(1, many, 8), 4);
     const RkBoneInfluence* kept = d.getVertexInfluences(1);
     float sum = 0;
