@@ -666,10 +666,13 @@ bool RkImporter::Private::convert(const aiScene* scene)
         scale = 1.8f / largest;
     else if (bones.isEmpty() && (largest < 0.05f || largest > 5.0f) && largest > 0.0f)
         scale = 1.0f / largest;
-    if (scale != 1.0f || unit != 1.0 || upAxis != 1 || upSign != 1)
-        rkLog(QStringLiteral("Import: \"%1\" turned to Y up from axis %2, scaled by %3")
+    if (upAxis != 1 || upSign != 1)
+        rkLog(QStringLiteral("Import: \"%1\" was modelled with %2%3 up; turned to +Y up")
+                  .arg(QFileInfo(path).fileName(), upSign < 0 ? QStringLiteral("-") : QString(),
+                       QLatin1Char("XYZ"[upAxis])));
+    if (scale != 1.0f || unit != 1.0)
+        rkLog(QStringLiteral("Import: \"%1\" scaled by %2 to a size that fits the scene")
                   .arg(QFileInfo(path).fileName())
-                  .arg(upAxis)
                   .arg(double(scale) * unit));
     // On the floor, centred.
     const RkVec3 shift(-(lo.x + hi.x) * 0.5f * scale, -lo.y * scale, -(lo.z + hi.z) * 0.5f * scale);
