@@ -669,7 +669,7 @@ bool RkImporter::Private::convert(const aiScene* scene)
     if (upAxis != 1 || upSign != 1)
         rkLog(QStringLiteral("Import: \"%1\" was modelled with %2%3 up; turned to +Y up")
                   .arg(QFileInfo(path).fileName(), upSign < 0 ? QStringLiteral("-") : QString(),
-                       QLatin1Char("XYZ"[upAxis])));
+                       QString(QLatin1Char("XYZ"[upAxis]))));
     if (scale != 1.0f || unit != 1.0)
         rkLog(QStringLiteral("Import: \"%1\" scaled by %2 to a size that fits the scene")
                   .arg(QFileInfo(path).fileName())
