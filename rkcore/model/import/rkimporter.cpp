@@ -937,7 +937,8 @@ void RkImporter::registerFileSource()
         node->setSource(QStringLiteral("%1:%2#%3").arg(QLatin1String(kScheme), path, print));
         node->setObject(nullptr);
         const QString who = node->getLabel().isEmpty() ? node->getName() : node->getLabel();
-        if (!QFileInfo::exists(path)) {
+        // Only plain files: a scene must not make the loader read a device or a folder.
+        if (!QFileInfo(path).isFile()) {
             reportSourceProblem(QStringLiteral("The model file \"%1\" of \"%2\" is missing; "
                                                "the node was loaded without geometry.")
                                     .arg(QDir::toNativeSeparators(path), who));
