@@ -194,6 +194,9 @@ struct RkImporter::Private {
     QString fingerprint;
     QString error;
     QStringList warnings;
+    // Log lines of the read, written when the model is built: the read may run on a worker
+    // thread, and the log belongs to the main one.
+    QStringList notes;
     bool cancelled = false;
     std::function<bool(float)> progress;
 
@@ -667,13 +670,14 @@ bool RkImporter::Private::convert(const aiScene* scene)
     else if (bones.isEmpty() && (largest < 0.05f || largest > 5.0f) && largest > 0.0f)
         scale = 1.0f / largest;
     if (upAxis != 1 || upSign != 1)
-        rkLog(QStringLiteral("Import: \"%1\" was modelled with %2%3 up; turned to +Y up")
-                  .arg(QFileInfo(path).fileName(), upSign < 0 ? QStringLiteral("-") : QString(),
-                       QString(QLatin1Char("XYZ"[upAxis]))));
+        notes.append(QStringLiteral("Import: \"%1\" was modelled with %2%3 up; turned to +Y up")
+                         .arg(QFileInfo(path).fileName(),
+                              upSign < 0 ? QStringLiteral("-") : QString(),
+                              QString(QLatin1Char("XYZ"[upAxis]))));
     if (scale != 1.0f || unit != 1.0)
-        rkLog(QStringLiteral("Import: \"%1\" scaled by %2 to a size that fits the scene")
-                  .arg(QFileInfo(path).fileName())
-                  .arg(double(scale) * unit));
+        notes.append(QStringLiteral("Import: \"%1\" scaled by %2 to a size that fits the scene")
+                         .arg(QFileInfo(path).fileName())
+                         .arg(double(scale) * unit));
     // On the floor, centred.
     const RkVec3 shift(-(lo.x + hi.x) * 0.5f * scale, -lo.y * scale, -(lo.z + hi.z) * 0.5f * scale);
     const auto place = [&](const RkVec3& p) { return p * scale + shift; };
@@ -720,6 +724,9 @@ void RkImporter::Private::buildObject(RkNode* node)
 {
     if (!mesh || !node)
         return;
+    for (const QString& note : notes)
+        rkLog(note);
+    notes.clear();
     auto* object = new RkObject(node->getName());
     QList<RkMaterial*> made;
     for (const Material& m : materials) {
@@ -822,7 +829,7 @@ bool RkImporter::read(const QString& path)
         return false;
     }
     for (const QString& w : d->warnings)
-        rkLog(QStringLiteral("Import: %1: %2").arg(shown, w));
+        d->notes.append(QStringLiteral("Import: %1: %2").arg(shown, w));
     return true;
 }
 
