@@ -153,8 +153,8 @@ bool RkSceneMenus::saveScene(const QString& path)
 
 void RkSceneMenus::importModel()
 {
-    const QString filter =
-        tr("Models (%1);;All files (*)").arg(RkImporter::filePatterns().join(QLatin1Char(' ')));
+    const QString filter = tr("Models (%1);;Scenes (*.rks);;All files (*)")
+                               .arg(RkImporter::filePatterns().join(QLatin1Char(' ')));
     const QString path = QFileDialog::getOpenFileName(
         d->window, tr("Import"), QFileInfo(rkScene->getFileName()).path(), filter);
     if (!path.isEmpty())
@@ -163,6 +163,9 @@ void RkSceneMenus::importModel()
 
 bool RkSceneMenus::importFile(const QString& path)
 {
+    // Our own scenes are opened, not imported.
+    if (QFileInfo(path).suffix().compare(QLatin1String("rks"), Qt::CaseInsensitive) == 0)
+        return openScene(path);
     QString error;
     QStringList warnings;
     if (RkImportRunner::importIntoScene(path, d->window, &error, &warnings)) {

@@ -36,7 +36,8 @@ public Q_SLOTS:
     bool saveScene(const QString& path);
     // Ask for a model file to import, with a filter of every format the importer reads.
     void importModel();
-    // Adds the model as a new node, selected and framed; false when refused or cancelled.
+    // Adds the model as a new node, selected and framed; false when refused or cancelled. A
+    // scene file (.rks) is opened instead.
     bool importFile(const QString& path);
 
 private:
