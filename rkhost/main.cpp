@@ -3,12 +3,14 @@
 #include "app/rkmainwindow.h"
 #include "app/rkstyle.h"
 #include "demo/rkdemoscene.h"
+#include "import/rkimporter.h"
 #include "panes/rkpanemgr.h"
 #include "plugin/rkpluginmgr.h"
 #include "render/rk3dviewport.h"
 #include "rkaboutplugins.h"
 #include "rkdemotools.h"
 #include "rkhostactions.h"
+#include "rkimportrunner.h"
 #include "rkposeactions.h"
 #include "rkpropertiesdock.h"
 #include "rkscenelist.h"
@@ -24,6 +26,7 @@
 #include <QDir>
 #include <QDockWidget>
 #include <QFile>
+#include <QFileInfo>
 #include <QGLWidget>
 #include <QMenu>
 #include <QPainter>
@@ -94,15 +97,35 @@ int runScript(const QString& fileName)
 // A scene named on the command line replaces the demo scene; one that cannot be opened leaves the
 // demo scene. The user is told why in a message box, or on stderr when the host runs unattended,
 // which then stops.
+// Any other file is imported as a model into a new scene.
 bool openStartScene(const QString& path, RkSceneMenus* menus, bool unattended)
 {
+    const bool scene =
+        QFileInfo(path).suffix().compare(QLatin1String("rks"), Qt::CaseInsensitive) == 0;
+    if (!scene) {
+        rkScene->clear();
+        if (!unattended) {
+            menus->importFile(path);
+            return true;
+        }
+        QString error;
+        if (RkImportRunner::importIntoScene(path, nullptr, &error))
+            return true;
+        std::fprintf(stderr, "rkhost: cannot import %s: %s\n", qPrintable(path),
+                     qPrintable(error.simplified()));
+        return false;
+    }
     if (!unattended) {
         menus->openScene(path);
         return true;
     }
     QString error;
-    if (rkScene->load(path, &error))
+    RkImporter::takeSourceProblems();
+    if (rkScene->load(path, &error)) {
+        for (const QString& problem : RkImporter::takeSourceProblems())
+            std::fprintf(stderr, "rkhost: %s\n", qPrintable(problem));
         return true;
+    }
     std::fprintf(stderr, "rkhost: cannot open scene %s: %s\n", qPrintable(path),
                  qPrintable(error.simplified()));
     return false;
@@ -265,9 +288,10 @@ int main(int argc, char** argv)
          QStringLiteral("Start, let the window settle, save it as PNG <file> and exit."),
          QStringLiteral("file")},
     });
-    parser.addPositionalArgument(QStringLiteral("scene"),
-                                 QStringLiteral("Open the scene file <scene> at start."),
-                                 QStringLiteral("[scene]"));
+    parser.addPositionalArgument(
+        QStringLiteral("file"),
+        QStringLiteral("Open the scene file <file> (.rks) at start, or import the model <file>."),
+        QStringLiteral("[file]"));
     parser.process(app);
 
     RkApp core;

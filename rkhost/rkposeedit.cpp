@@ -154,7 +154,9 @@ QList<RkProperty*> RkPoseEdit::lockTargets(const RkScene* scene, Scope scope)
 
 bool RkPoseEdit::isTransform(const RkProperty* property)
 {
-    return startsGroup(property->getPath(), QStringLiteral("Transforms"));
+    // Imported bones keep their turns and moves in a "Pose" group.
+    return startsGroup(property->getPath(), QStringLiteral("Transforms")) ||
+           startsGroup(property->getPath(), QStringLiteral("Pose"));
 }
 
 bool RkPoseEdit::isMorph(const RkProperty* property)

@@ -2,6 +2,8 @@
 
 #include "app/rkapp.h"
 #include "app/rkmainwindow.h"
+#include "import/rkimporter.h"
+#include "rkimportrunner.h"
 #include "scene/rkscene.h"
 #include "undo/rkundostack.h"
 
@@ -22,6 +24,7 @@ struct RkSceneMenus::Private {
     QAction* openAction = nullptr;
     QAction* saveAction = nullptr;
     QAction* saveAsAction = nullptr;
+    QAction* importAction = nullptr;
     QAction* undoAction = nullptr;
     QAction* redoAction = nullptr;
 };
@@ -35,6 +38,9 @@ RkSceneMenus::RkSceneMenus(RkMainWindow* window) : QObject(window), d(std::make_
     d->saveAction = file->addAction(tr("&Save"), this, &RkSceneMenus::save, QKeySequence::Save);
     d->saveAsAction =
         file->addAction(tr("Save &As..."), this, &RkSceneMenus::saveAs, QKeySequence::SaveAs);
+    file->addSeparator();
+    d->importAction = file->addAction(tr("&Import..."), this, &RkSceneMenus::importModel);
+    d->importAction->setObjectName(QStringLiteral("ImportAction"));
     file->addSeparator();
 
     QMenu* edit = window->addMenu(QStringLiteral("&Edit"));
@@ -71,6 +77,10 @@ QAction* RkSceneMenus::saveAction() const
 QAction* RkSceneMenus::saveAsAction() const
 {
     return d->saveAsAction;
+}
+QAction* RkSceneMenus::importAction() const
+{
+    return d->importAction;
 }
 QAction* RkSceneMenus::undoAction() const
 {
@@ -117,8 +127,13 @@ void RkSceneMenus::saveAs()
 bool RkSceneMenus::openScene(const QString& path)
 {
     QString error;
-    if (rkScene->load(path, &error))
+    RkImporter::takeSourceProblems();
+    if (rkScene->load(path, &error)) {
+        const QStringList problems = RkImporter::takeSourceProblems();
+        if (!problems.isEmpty())
+            tellUser(tr("Open Scene"), problems.join(QLatin1Char('\n')));
         return true;
+    }
     tellUser(tr("Open Scene"),
              tr("The scene \"%1\" could not be opened: %2.\nThe scene you had is unchanged.")
                  .arg(QFileInfo(path).fileName(), error));
@@ -133,6 +148,35 @@ bool RkSceneMenus::saveScene(const QString& path)
     tellUser(
         tr("Save Scene"),
         tr("The scene could not be saved as \"%1\": %2.").arg(QFileInfo(path).fileName(), error));
+    return false;
+}
+
+void RkSceneMenus::importModel()
+{
+    const QString filter = tr("Models (%1);;Scenes (*.rks);;All files (*)")
+                               .arg(RkImporter::filePatterns().join(QLatin1Char(' ')));
+    const QString path = QFileDialog::getOpenFileName(
+        d->window, tr("Import"), QFileInfo(rkScene->getFileName()).path(), filter);
+    if (!path.isEmpty())
+        importFile(path);
+}
+
+bool RkSceneMenus::importFile(const QString& path)
+{
+    // Our own scenes are opened, not imported.
+    if (QFileInfo(path).suffix().compare(QLatin1String("rks"), Qt::CaseInsensitive) == 0)
+        return openScene(path);
+    QString error;
+    QStringList warnings;
+    if (RkImportRunner::importIntoScene(path, d->window, &error, &warnings)) {
+        if (!warnings.isEmpty())
+            tellUser(tr("Import"), tr("\"%1\" was imported with repairs:\n%2")
+                                       .arg(QFileInfo(path).fileName(), warnings.join('\n')));
+        return true;
+    }
+    // A cancelled import needs no message: the user asked for it.
+    if (!error.isEmpty())
+        tellUser(tr("Import"), tr("%1.\nThe scene is unchanged.").arg(error));
     return false;
 }
 

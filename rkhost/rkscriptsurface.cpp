@@ -3,6 +3,7 @@
 #include "properties/rkboolproperty.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkintproperty.h"
+#include "rkimportrunner.h"
 #include "scene/rknode.h"
 #include "scene/rkscene.h"
 #include "undo/rkundostack.h"
@@ -201,6 +202,12 @@ public:
         return rkScene && rkScene->load(path, &m_lastError);
     }
 
+    // Imports a model file as a new node, selected and framed.
+    Q_INVOKABLE bool importFile(const QString& path)
+    {
+        m_lastError.clear();
+        return rkScene && RkImportRunner::importIntoScene(path, nullptr, &m_lastError);
+    }
     Q_INVOKABLE bool save(const QString& path)
     {
         m_lastError.clear();

@@ -4,7 +4,8 @@ class QScriptEngine;
 
 // Lets scripts drive the scene. Installs these globals in the engine:
 //   scene      getNumNodes(), getNode(index), findNode(nameOrLabel), selectNode(nameOrNode, add),
-//              clearSelection(), getPrimarySelection(), load(path), save(path), lastError
+//              clearSelection(), getPrimarySelection(), load(path), save(path),
+//              importFile(path), lastError
 //   undoStack  undo(), redo(), getUndoCaption(), count()
 //   wait(ms)   runs the event loop for ms milliseconds
 // Nodes reach scripts with name, label and findProperty(nameOrLabel); properties with name,

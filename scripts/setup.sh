@@ -8,6 +8,7 @@ packages=(
   qtbase5-dev qtscript5-dev libqt5opengl5-dev libglu1-mesa-dev
   xvfb xauth libgl1-mesa-dri
   libbenchmark-dev clang-format
+  libassimp-dev assimp-testmodels
 )
 
 missing=()

@@ -50,6 +50,7 @@ private Q_SLOTS:
     void scriptConstructsModuleClasses();
     void scriptErrorExitsNonZero();
     void sceneFileOnTheCommandLine();
+    void modelOnTheCommandLineIsImportedTextured();
     void refusedModulesLeaveTheHostRunning();
     void noDisplaySaysWhatToDoButListsPlugins();
 
@@ -130,6 +131,42 @@ void TestRkHost::sceneFileOnTheCommandLine()
     QCOMPARE(failed.err.count(QLatin1Char('\n')), 1);
     QVERIFY2(failed.err.startsWith(QStringLiteral("rkhost: cannot open scene ")) &&
                  failed.err.contains(QStringLiteral("bad.rks: ")),
+             qPrintable(failed.err));
+}
+
+void TestRkHost::modelOnTheCommandLineIsImportedTextured()
+{
+    const QString model =
+        QStringLiteral("/usr/share/assimp/models/glTF2/BoxTextured-glTF-Binary/BoxTextured.glb");
+    if (!QFile::exists(model))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    const QString script =
+        writeScript(m_dir, QStringLiteral("model.js"),
+                    QStringLiteral("scene.clearSelection();\n"
+                                   "print(scene.getNumNodes(), scene.getNode(0).name);\n"));
+    const QString png = m_dir.filePath(QStringLiteral("model.png"));
+    const Run run =
+        runHost({model, QStringLiteral("--script"), script, QStringLiteral("--screenshot"), png});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QCOMPARE(run.out, QStringLiteral("1 BoxTextured\n"));
+    // The box is framed and its texture, a blue sky over a green hill, fills the middle.
+    QImage image(png);
+    QVERIFY(!image.isNull());
+    int sky = 0, hill = 0;
+    for (int y = image.height() / 4; y < image.height() * 3 / 4; y += 2) {
+        for (int x = image.width() / 4; x < image.width() / 2; x += 2) {
+            const QColor c = image.pixelColor(x, y);
+            sky += c.blue() > c.red() + 60 && c.blue() > c.green() + 20;
+            hill += c.green() > c.red() + 30 && c.green() > c.blue() + 30;
+        }
+    }
+    QVERIFY2(sky > 500 && hill > 500, qPrintable(QStringLiteral("%1 %2").arg(sky).arg(hill)));
+
+    const QString bad = writeScript(m_dir, QStringLiteral("bad.gltf"), QStringLiteral("{ nope"));
+    const Run failed = runHost({bad, QStringLiteral("--script"), script});
+    QCOMPARE(failed.exitCode, 1);
+    QVERIFY2(failed.err.contains(QStringLiteral("rkhost: cannot import ")) &&
+                 failed.err.contains(QStringLiteral("bad.gltf")),
              qPrintable(failed.err));
 }
 

@@ -1,6 +1,7 @@
 #include "actions/rkaction.h"
 #include "actions/rkactionmgr.h"
 #include "demo/rkdemoscene.h"
+#include "import/rkimporter.h"
 #include "properties/rkfloatproperty.h"
 #include "rkposeactions.h"
 #include "rkposeedit.h"
@@ -29,6 +30,7 @@ private Q_SLOTS:
     void symmetryPairsAndMirrors();
     void moveToFloor_data();
     void moveToFloor();
+    void zeroPoseReachesImportedBones();
 
 private:
     RkAction* action(const char* className)
@@ -401,6 +403,33 @@ void TestRkPoseActions::moveToFloor()
     QVERIFY2(std::abs(lowest) < 1e-4f, qPrintable(QString::number(lowest)));
     rkUndoStack->undo();
     QCOMPARE(target->getYTranslate()->getValue(), shift);
+}
+
+void TestRkPoseActions::zeroPoseReachesImportedBones()
+{
+    const QString model =
+        QStringLiteral("/usr/share/assimp/models/glTF2/simple_skin/simple_skin.gltf");
+    if (!QFile::exists(model))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    RkImporter importer;
+    QVERIFY(importer.read(model));
+    auto* imported = qobject_cast<RkSkeleton*>(importer.addToScene(rkScene));
+    QVERIFY(imported);
+    QList<RkBone*> bones;
+    imported->getAllBones(bones);
+    QVERIFY(bones.size() >= 2);
+    RkBone* bone = bones.last();
+    QCOMPARE(bone->getZRotate()->getPath(), QStringLiteral("Pose"));
+    bone->getZRotate()->setValue(35.0f);
+    bone->getYTranslate()->setValue(0.2f);
+    RkFloatProperty* demoTurn = figure->findBone(QStringLiteral("lShldr"))->getZRotate();
+    demoTurn->setValue(20.0f);
+    rkScene->selectNode(imported);
+    action("RkZeroFigurePoseAction")->trigger();
+    QCOMPARE(bone->getZRotate()->getValue(), 0.0f);
+    QCOMPARE(bone->getYTranslate()->getValue(), 0.0f);
+    // The demo figure was not selected and keeps its pose.
+    QCOMPARE(demoTurn->getValue(), 20.0f);
 }
 
 RK_TEST_MAIN(TestRkPoseActions)

@@ -1,6 +1,7 @@
 #include "app/rkmainwindow.h"
 #include "demo/rkdemoscene.h"
 #include "properties/rkfloatproperty.h"
+#include "rkimportrunner.h"
 #include "rkscenelist.h"
 #include "rkscenemenus.h"
 #include "rktestmain.h"
@@ -10,8 +11,15 @@
 #include "undo/rkundostack.h"
 #include "undo/rkundostackhold.h"
 
+#include "import/rkimporter.h"
+#include "render/rk3dviewport.h"
+#include "scene/rkobject.h"
+#include "viewport/rkviewport.h"
+
 #include <QAction>
 #include <QMessageBox>
+#include <QProgressDialog>
+#include <QPushButton>
 #include <QTemporaryDir>
 
 class TestRkSceneMenus : public QObject
@@ -24,6 +32,9 @@ private Q_SLOTS:
     void badFileKeepsTheSceneAndSaysWhy();
     void saveThenOpenBringsTheSceneBack();
     void sceneListSelects();
+    void importSelectsAndFrames();
+    void cancelledImportLeavesTheScene();
+    void missingModelIsReportedOnOpen();
 
 private:
     RkMainWindow* window = nullptr;
@@ -136,6 +147,100 @@ void TestRkSceneMenus::sceneListSelects()
     QVERIFY(head);
     QCOMPARE(head->background(0).color(), list->palette().color(QPalette::Highlight));
     QCOMPARE(cameraItem->background(0).style(), Qt::NoBrush);
+}
+
+namespace
+{
+const QString Figure = QStringLiteral("/usr/share/assimp/models/X/BCN_Epileptic.X");
+}
+
+void TestRkSceneMenus::importSelectsAndFrames()
+{
+    if (!QFile::exists(Figure))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    auto* view = new Rk3DViewport;
+    window->setSceneWidget(view);
+    QCOMPARE(window->getMainViewport()->get3DViewport(), view);
+    const float distance = view->getCamera().distance;
+    QVERIFY(menus->importFile(Figure));
+    RkNode* figure = rkScene->getPrimarySelection();
+    QVERIFY(qobject_cast<RkSkeleton*>(figure));
+    QCOMPARE(figure->getName(), QStringLiteral("BCN_Epileptic"));
+    // Framed on the figure, which stands 1.6 units tall at the origin.
+    const RkSceneRenderer::Camera camera = view->getCamera();
+    QVERIFY(camera.distance != distance);
+    QVERIFY(camera.target.y > 0.5f && camera.target.y < 1.2f);
+    QVERIFY(std::fabs(camera.target.x) < 0.2f);
+    QVERIFY(!window->findChild<QMessageBox*>("SceneMessage"));
+    QTRY_COMPARE(list->topLevelItemCount(), 5);
+
+    // A second import of the same file gets a name of its own; a refused one says why.
+    QVERIFY(menus->importFile(Figure));
+    QCOMPARE(rkScene->getPrimarySelection()->getName(), QStringLiteral("BCN_Epileptic 2"));
+    const int nodes = rkScene->getNumNodes();
+    QVERIFY(!menus->importFile(dir.filePath("nothing.gltf")));
+    QCOMPARE(rkScene->getNumNodes(), nodes);
+    auto* box = window->findChild<QMessageBox*>("SceneMessage");
+    QVERIFY(box);
+    QVERIFY2(box->text().contains("nothing.gltf") && box->text().contains("unchanged"),
+             qPrintable(box->text()));
+    box->close();
+}
+
+void TestRkSceneMenus::cancelledImportLeavesTheScene()
+{
+    if (!QFile::exists(Figure))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    const QStringList before = [] {
+        QStringList names;
+        for (RkNode* n : rkScene->getNodes())
+            names << n->getName();
+        return names;
+    }();
+    RkImporter importer;
+    RkImportRunner runner(window);
+    runner.setDialogDelay(0);
+    bool shown = false;
+    connect(&runner, &RkImportRunner::dialogShown, this, [&] {
+        shown = true;
+        QProgressDialog* dialog = window->findChild<QProgressDialog*>("ImportProgress");
+        QVERIFY(dialog && dialog->isVisible());
+        QPushButton* cancel = dialog->findChild<QPushButton*>();
+        QVERIFY(cancel);
+        QTest::mouseClick(cancel, Qt::LeftButton);
+    });
+    QVERIFY(!runner.read(&importer, Figure));
+    QVERIFY(shown);
+    QVERIFY(runner.wasCancelled());
+    QVERIFY(!runner.getDialog()->isVisible());
+    QStringList after;
+    for (RkNode* n : rkScene->getNodes())
+        after << n->getName();
+    QCOMPARE(after, before);
+}
+
+void TestRkSceneMenus::missingModelIsReportedOnOpen()
+{
+    const QString cube = QStringLiteral("/usr/share/assimp/models/OBJ/box.obj");
+    if (!QFile::exists(cube))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    QVERIFY(QFile::copy(cube, dir.filePath("crate.obj")));
+    QVERIFY(menus->importFile(dir.filePath("crate.obj")));
+    QVERIFY(menus->saveScene(dir.filePath("crate.rks")));
+    const int nodes = rkScene->getNumNodes();
+    QVERIFY(QFile::remove(dir.filePath("crate.obj")));
+    rkScene->clear();
+    // A scene picked for import opens as a scene.
+    QVERIFY(menus->importFile(dir.filePath("crate.rks")));
+    QCOMPARE(rkScene->getNumNodes(), nodes);
+    QVERIFY(rkScene->findNode("crate"));
+    QVERIFY(!rkScene->findNode("crate")->getObject());
+    auto* box = window->findChild<QMessageBox*>("SceneMessage");
+    QVERIFY(box);
+    QTRY_VERIFY(box->isVisible());
+    QVERIFY2(box->text().contains("crate.obj") && box->text().contains("missing"),
+             qPrintable(box->text()));
+    box->close();
 }
 
 RK_TEST_MAIN(TestRkSceneMenus)

@@ -21,6 +21,7 @@ private Q_SLOTS:
     void deletedNodeReadsUndefined();
     void waitRunsPostedEventsAndTimers();
     void loadAndSave();
+    void importFile();
 
 private:
     // The script's result as text, or the uncaught error.
@@ -166,6 +167,22 @@ void TestRkScriptSurface::loadAndSave()
     QCOMPARE(run(QString("[scene.load('%1'), scene.lastError.length > 0, scene.getNumNodes()]")
                      .arg(dir.filePath("missing.rks"))),
              QString("false,true,%1").arg(nodes));
+}
+
+void TestRkScriptSurface::importFile()
+{
+    const QString model = QStringLiteral("/usr/share/assimp/models/OBJ/box.obj");
+    if (!QFile::exists(model))
+        QSKIP("Debian's assimp-testmodels is not installed (scripts/setup.sh installs it)");
+    const int nodes = rkScene->getNumNodes();
+    QCOMPARE(run(QString("[scene.importFile('%1'), scene.lastError, scene.getNumNodes(),"
+                         " scene.getPrimarySelection().name]")
+                     .arg(model)),
+             QString("true,,%1,box").arg(nodes + 1));
+    const QString result =
+        run(QString("[scene.importFile('%1'), scene.lastError]").arg(dir.filePath("none.obj")));
+    QVERIFY2(result.startsWith("false,") && result.contains("none.obj"), qPrintable(result));
+    QCOMPARE(rkScene->getNumNodes(), nodes + 1);
 }
 
 RK_TEST_MAIN(TestRkScriptSurface)

@@ -150,3 +150,8 @@ void RkOutFile::setError(const QString& message)
     if (d->error.isEmpty())
         d->error = message.isEmpty() ? QStringLiteral("unknown error") : message;
 }
+
+QString RkOutFile::fileName() const
+{
+    return d->fileName;
+}

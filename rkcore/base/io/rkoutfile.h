@@ -37,6 +37,9 @@ public:
     // A section holding one byte array.
     void writeByteArraySection(short id, const QByteArray& bytes);
 
+    // The file being written, when the writer knows it; empty otherwise.
+    QString fileName() const;
+
     bool hasError() const;
     QString errorString() const;
     void setError(const QString& message);

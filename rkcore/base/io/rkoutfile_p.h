@@ -14,6 +14,7 @@ struct RkOutFile::Private {
     bool inSection = false;
     int lengthPos = -1;
     QString error;
+    QString fileName;
     // Turns an object into a stored reference (kind, target, property name); false fails the
     // file with the error it set.
     std::function<bool(const RkBase*, quint8&, qint32&, QString&)> resolve;

@@ -23,6 +23,8 @@ void announceSelection()
 struct RkMaterial::Private {
     bool selected = false;
     QColor diffuse = QColor(200, 200, 200);
+    QImage texture;
+    QString textureName;
     QList<RkShape*> shapes;
 };
 
@@ -120,4 +122,21 @@ void RkMaterial::addShape(RkShape* shape)
 void RkMaterial::removeShape(RkShape* shape)
 {
     d->shapes.removeAll(shape);
+}
+
+QImage RkMaterial::getDiffuseTexture() const
+{
+    return d->texture;
+}
+
+QString RkMaterial::getDiffuseTextureName() const
+{
+    return d->textureName;
+}
+
+void RkMaterial::setDiffuseTexture(const QImage& image, const QString& name)
+{
+    d->texture = image;
+    d->textureName = name;
+    Q_EMIT diffuseColorChanged();
 }

@@ -3,6 +3,7 @@
 #include "scene/rkelement.h"
 
 #include <QColor>
+#include <QImage>
 #include <QListIterator>
 
 #include <memory>
@@ -31,6 +32,12 @@ public:
 
     QColor getDiffuseColor() const;
     void setDiffuseColor(const QColor& colour);
+
+    // The picture mapped over the surface by its UVs, tinted by the diffuse colour; a null
+    // image for none. name says where it came from (a file name) and is only shown.
+    QImage getDiffuseTexture() const;
+    QString getDiffuseTextureName() const;
+    void setDiffuseTexture(const QImage& image, const QString& name = QString());
 
     // The shapes that use the material, in the order they took it up.
     QListIterator<RkShape*> shapeListIterator() const;

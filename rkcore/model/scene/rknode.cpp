@@ -9,6 +9,7 @@
 #include "properties/rkpropertygrouptree.h"
 #include "scene/rkelementdata.h"
 #include "scene/rkobject.h"
+#include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
 
 #include <QPointer>
@@ -271,7 +272,7 @@ void RkNode::save(RkOutFile* file) const
 {
     file->startSection(SectionInfo);
     file->writeString(getLabel());
-    file->writeString(d->source);
+    file->writeString(RkScene::storedSource(d->source, file->fileName()));
     file->writeFloat(d->origin.x());
     file->writeFloat(d->origin.y());
     file->writeFloat(d->origin.z());

@@ -15,7 +15,25 @@ struct RkObject::Private {
     RkMeshDeformer deformer;
     QVector<QPointer<RkFloatProperty>> morphProperties;
     mutable QVector<float> weights;
+    QVector<QPointer<RkNode>> skinBones;
+    mutable QVector<RkXform> boneXforms;
 };
+
+namespace
+{
+
+RkXform toXform(const QMatrix4x4& m)
+{
+    RkXform x;
+    for (int r = 0; r < 3; ++r) {
+        for (int c = 0; c < 3; ++c)
+            x.r[3 * r + c] = m(r, c);
+    }
+    x.t = RkVec3(m(0, 3), m(1, 3), m(2, 3));
+    return x;
+}
+
+} // namespace
 
 RkObject::RkObject(const QString& name, QObject* parent)
     : RkElement(parent, name), d(std::make_unique<Private>())
@@ -61,6 +79,7 @@ void RkObject::setGeometry(RkGeometry* geometry)
     // Morph targets belong to the old vertices.
     d->deformer = RkMeshDeformer();
     d->morphProperties.clear();
+    d->skinBones.clear();
     if (geometry)
         d->deformer.setRestPositions(geometry->getVertices());
     notifyUVsChanged();
@@ -89,6 +108,31 @@ RkFloatProperty* RkObject::getMorphProperty(int index) const
     return d->morphProperties.value(index);
 }
 
+void RkObject::setSkinBones(const QList<RkNode*>& bones)
+{
+    d->skinBones.clear();
+    for (RkNode* bone : bones)
+        d->skinBones.append(bone);
+}
+
+QList<RkNode*> RkObject::getSkinBones() const
+{
+    QList<RkNode*> bones;
+    for (const QPointer<RkNode>& bone : d->skinBones)
+        bones.append(bone.data());
+    return bones;
+}
+
+int RkObject::setVertexInfluences(int vertex, const RkBoneInfluence* influences, int count)
+{
+    return d->deformer.setVertexInfluences(vertex, influences, count);
+}
+
+const RkMeshDeformer& RkObject::getDeformer() const
+{
+    return d->deformer;
+}
+
 void RkObject::getDeformedVertices(QVector<RkVec3>& out, bool world) const
 {
     if (!d->geometry) {
@@ -101,17 +145,21 @@ void RkObject::getDeformedVertices(QVector<RkVec3>& out, bool world) const
         const RkFloatProperty* p = d->morphProperties[i];
         d->weights[i] = p ? p->getValue() : 0.0f;
     }
-    RkXform xform;
-    const RkNode* node = world ? getNode() : nullptr;
-    if (node) {
-        const QMatrix4x4 m = node->getWorldTransform();
-        for (int r = 0; r < 3; ++r) {
-            for (int c = 0; c < 3; ++c)
-                xform.r[3 * r + c] = m(r, c);
+    const RkNode* owner = getNode();
+    const QMatrix4x4 nodeWorld = owner ? owner->getWorldTransform() : QMatrix4x4();
+    // Skin bones move relative to the node, which then carries the whole object.
+    const int numBones = d->skinBones.size();
+    d->boneXforms.resize(numBones);
+    if (numBones > 0) {
+        const QMatrix4x4 toNode = nodeWorld.inverted();
+        for (int b = 0; b < numBones; ++b) {
+            const RkNode* bone = d->skinBones[b];
+            d->boneXforms[b] = bone ? toXform(toNode * bone->getWorldTransform()) : RkXform();
         }
-        xform.t = RkVec3(m(0, 3), m(1, 3), m(2, 3));
     }
-    d->deformer.deform(d->weights.constData(), n, nullptr, 0, out);
+    d->deformer.deform(d->weights.constData(), n, d->boneXforms.constData(), numBones, out);
+    const RkNode* node = world ? owner : nullptr;
+    const RkXform xform = node ? toXform(nodeWorld) : RkXform();
     // The whole object follows its node.
     if (node) {
         for (RkVec3& v : out)

@@ -16,7 +16,8 @@ class RkShape;
 // What a node shows: a geometry in the node's rest coordinates, the shapes that carry its
 // materials, and morph targets driven by float properties. The deformed vertices are the rest
 // vertices with each morph's offsets added at its property's value, carried by the owning node's
-// world transform (a bone's transform for a figure's body part). Its element parent is the node.
+// world transform (a bone's transform for a figure's body part), or by the blend of its skin
+// bones' transforms. Its element parent is the node.
 class RKCORE_EXPORT RkObject : public RkElement
 {
     Q_OBJECT
@@ -42,6 +43,15 @@ public:
     void addMorph(const RkMorphDeltas& morph, RkFloatProperty* property);
     int getNumMorphs() const;
     RkFloatProperty* getMorphProperty(int index) const;
+
+    // Skins the geometry to bones of the node's figure (watched, not owned): influences name
+    // bones by their place in this list, and a vertex with influences follows the blend of their
+    // transforms relative to the node. A bone that is gone counts as unposed.
+    void setSkinBones(const QList<RkNode*>& bones);
+    QList<RkNode*> getSkinBones() const;
+    // See RkMeshDeformer::setVertexInfluences.
+    int setVertexInfluences(int vertex, const RkBoneInfluence* influences, int count);
+    const RkMeshDeformer& getDeformer() const;
 
     // The vertices as shown: morphs applied, then the node's world transform (when world is
     // true). A geometry-less object gives none.

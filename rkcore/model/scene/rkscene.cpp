@@ -16,6 +16,26 @@ QHash<QString, RkScene::SourceBuilder>& sourceBuilders()
     return builders;
 }
 
+struct Scheme {
+    RkScene::SchemeBuilder builder;
+    RkScene::SchemeStorer storer;
+};
+
+QHash<QString, Scheme>& sourceSchemes()
+{
+    static QHash<QString, Scheme> schemes;
+    return schemes;
+}
+
+const Scheme* schemeOf(const QString& source)
+{
+    const int colon = source.indexOf(QLatin1Char(':'));
+    if (colon <= 0)
+        return nullptr;
+    const auto it = sourceSchemes().constFind(source.left(colon));
+    return it == sourceSchemes().constEnd() ? nullptr : &*it;
+}
+
 } // namespace
 
 struct RkScene::Private {
@@ -314,13 +334,35 @@ void RkScene::registerSourceBuilder(const QString& source, SourceBuilder builder
         sourceBuilders().remove(source);
 }
 
-bool RkScene::buildFromSource(RkNode* node)
+void RkScene::registerSourceScheme(const QString& scheme, SchemeBuilder builder,
+                                   SchemeStorer storer)
+{
+    if (builder)
+        sourceSchemes().insert(scheme, Scheme{std::move(builder), std::move(storer)});
+    else
+        sourceSchemes().remove(scheme);
+}
+
+bool RkScene::buildFromSource(RkNode* node, const QString& sceneFile)
 {
     if (!node || node->getSource().isEmpty())
         return false;
     const auto it = sourceBuilders().constFind(node->getSource());
-    if (it == sourceBuilders().constEnd())
+    if (it != sourceBuilders().constEnd()) {
+        (*it)(node);
+        return true;
+    }
+    const Scheme* scheme = schemeOf(node->getSource());
+    if (!scheme)
         return false;
-    (*it)(node);
+    scheme->builder(node, sceneFile);
     return true;
+}
+
+QString RkScene::storedSource(const QString& source, const QString& sceneFile)
+{
+    if (sourceBuilders().contains(source))
+        return source;
+    const Scheme* scheme = schemeOf(source);
+    return scheme && scheme->storer ? scheme->storer(source, sceneFile) : source;
 }

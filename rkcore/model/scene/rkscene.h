@@ -60,8 +60,18 @@ public:
     // scene is built or loaded.
     using SourceBuilder = std::function<void(RkNode*)>;
     static void registerSourceBuilder(const QString& source, SourceBuilder builder);
+    // Builders for every source of one scheme, the part of the key before the first colon
+    // ("file" for "file:figure.gltf"); a key registered as a whole wins over its scheme.
+    // sceneFile is the scene file being loaded (empty outside a load). The storer, when given,
+    // turns a key into what a scene file at sceneFile stores, for example a path relative to it.
+    using SchemeBuilder = std::function<void(RkNode*, const QString& sceneFile)>;
+    using SchemeStorer = std::function<QString(const QString& source, const QString& sceneFile)>;
+    static void registerSourceScheme(const QString& scheme, SchemeBuilder builder,
+                                     SchemeStorer storer = SchemeStorer());
     // Runs the builder registered for the node's source; false when there is none.
-    static bool buildFromSource(RkNode* node);
+    static bool buildFromSource(RkNode* node, const QString& sceneFile = QString());
+    // The key as a scene file at sceneFile stores it.
+    static QString storedSource(const QString& source, const QString& sceneFile);
 
 Q_SIGNALS:
     void nodeAdded(RkNode* node);

@@ -69,7 +69,7 @@ QString describe(const QObject* object)
 
 } // namespace
 
-QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
+QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error, const QString& fileName)
 {
     // The object table: the nodes first, then every object they point at, in the order met.
     QList<const RkBase*> objects;
@@ -83,6 +83,7 @@ QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
     }
 
     RkOutFile out;
+    out.d->fileName = fileName;
     out.d->resolve = [&](const RkBase* object, quint8& kind, qint32& target, QString& property) {
         if (auto* p = qobject_cast<const RkProperty*>(object)) {
             const RkElement* owner = RkElement::elementOf(p);
@@ -181,7 +182,7 @@ QByteArray RkSceneWriter::write(const RkNodeList& nodes, QString* error)
 bool RkSceneWriter::writeFile(const RkNodeList& nodes, const QString& path, QString* error)
 {
     QString problem;
-    const QByteArray bytes = write(nodes, &problem);
+    const QByteArray bytes = write(nodes, &problem, path);
     if (bytes.isEmpty()) {
         setError(error, problem);
         return false;
@@ -507,7 +508,8 @@ bool RkSceneReader::read(const QByteArray& bytes, const QString& fileName)
         try {
             for (size_t i = 0; i < d->objects.size(); ++i) {
                 if (d->isNode[i] && d->objects[i])
-                    RkScene::buildFromSource(static_cast<RkNode*>(d->objects[i].data()));
+                    RkScene::buildFromSource(static_cast<RkNode*>(d->objects[i].data()),
+                                             d->file.fileName());
             }
         } catch (const QString& message) {
             ok = d->fail(message);

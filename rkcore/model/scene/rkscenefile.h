@@ -12,7 +12,9 @@
 class RKCORE_EXPORT RkSceneWriter
 {
 public:
-    static QByteArray write(const RkNodeList& nodes, QString* error = nullptr);
+    // fileName: where the bytes will be stored, so that sources beside it are stored relative.
+    static QByteArray write(const RkNodeList& nodes, QString* error = nullptr,
+                            const QString& fileName = QString());
     static bool writeFile(const RkNodeList& nodes, const QString& path, QString* error = nullptr);
 };
 

@@ -1,6 +1,7 @@
 #include "app/rkapp.h"
 
 #include "actions/rkhelpmgr.h"
+#include "import/rkimporter.h"
 #include "log/rklog.h"
 #include "plugin/rkpluginmgr.h"
 #include "scene/rkscene.h"
@@ -61,6 +62,8 @@ RkApp::RkApp(QObject* parent) : QObject(parent), d(std::make_unique<Private>())
     d->helpMgr = new RkHelpMgr(this);
     rkUndoStack = new RkUndoStack(this);
     rkScene = new RkScene(this);
+    // Imported models are rebuilt from their files whenever a scene is loaded.
+    RkImporter::registerFileSource();
 }
 
 RkApp::~RkApp()

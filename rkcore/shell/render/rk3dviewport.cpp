@@ -96,6 +96,7 @@ void Rk3DViewport::Private::gather(QVector<RkSceneRenderer::Item>& items, bool h
                 const RkMaterial* material = shape->getMaterial(m);
                 item.materialColours.append(material ? material->getDiffuseColor()
                                                      : QColor(180, 180, 180));
+                item.materialTextures.append(material ? material->getDiffuseTexture() : QImage());
             }
         }
         item.highlighted = highlight && (node->isSelected() || (figure && figure->isSelected()));

@@ -1,8 +1,10 @@
 #include "render/rkscenerenderer.h"
 
 #include "geometry/rkgeometry.h"
+#include "geometry/rkmap.h"
 
 #include <QHash>
+#include <QSet>
 
 #include <GL/gl.h>
 
@@ -26,6 +28,7 @@ struct TriangleCache {
     quint64 revision = 0;
     QVector<int> materials;          // material of each group
     QVector<QVector<GLuint>> groups; // triangle corner indices of each group
+    QVector<QVector<GLuint>> uvs;    // the corners' UV indices, in step with groups
 };
 
 void buildTriangles(const RkGeometry* g, TriangleCache& cache)
@@ -33,6 +36,7 @@ void buildTriangles(const RkGeometry* g, TriangleCache& cache)
     cache.revision = g->getRevision();
     cache.materials.clear();
     cache.groups.clear();
+    cache.uvs.clear();
     int slot[256];
     std::fill(std::begin(slot), std::end(slot), -1);
     for (int f = 0, n = g->getNumFacets(); f < n; ++f) {
@@ -41,12 +45,18 @@ void buildTriangles(const RkGeometry* g, TriangleCache& cache)
             slot[m] = cache.groups.size();
             cache.materials.append(m);
             cache.groups.append(QVector<GLuint>());
+            cache.uvs.append(QVector<GLuint>());
         }
         QVector<GLuint>& out = cache.groups[slot[m]];
         const int* v = g->getFacetVertices(f);
         out << GLuint(v[0]) << GLuint(v[1]) << GLuint(v[2]);
         if (g->getFacetSize(f) == 4)
             out << GLuint(v[0]) << GLuint(v[2]) << GLuint(v[3]);
+        QVector<GLuint>& uv = cache.uvs[slot[m]];
+        const int* t = g->getFacetUVs(f);
+        uv << GLuint(t[0]) << GLuint(t[1]) << GLuint(t[2]);
+        if (g->getFacetSize(f) == 4)
+            uv << GLuint(t[0]) << GLuint(t[2]) << GLuint(t[3]);
     }
 }
 
@@ -102,7 +112,41 @@ void colourOf(const QColor& c, GLfloat out[4])
 struct RkSceneRenderer::Private {
     QHash<const RkGeometry*, TriangleCache> triangles;
     QVector<RkVec3> normals;
+    // Texture objects of the current context by image, and those used by the current draw.
+    QHash<qint64, GLuint> textures;
+    QSet<qint64> texturesUsed;
+
+    GLuint textureFor(const QImage& image);
 };
+
+GLuint RkSceneRenderer::Private::textureFor(const QImage& image)
+{
+    const qint64 key = image.cacheKey();
+    texturesUsed.insert(key);
+    const auto it = textures.constFind(key);
+    if (it != textures.constEnd())
+        return *it;
+    GLint limit = 0;
+    glGetIntegerv(GL_MAX_TEXTURE_SIZE, &limit);
+    limit = std::max(limit, 64);
+    QImage pixels = image;
+    if (pixels.width() > limit || pixels.height() > limit)
+        pixels = pixels.scaled(limit, limit, Qt::KeepAspectRatio, Qt::SmoothTransformation);
+    // UV (0, 0) is the picture's lower left corner, which OpenGL keeps in its first row.
+    pixels = pixels.convertToFormat(QImage::Format_RGBA8888).mirrored();
+    GLuint id = 0;
+    glGenTextures(1, &id);
+    glBindTexture(GL_TEXTURE_2D, id);
+    glPixelStorei(GL_UNPACK_ALIGNMENT, 4);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, GL_LINEAR);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, GL_LINEAR);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_S, GL_REPEAT);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_T, GL_REPEAT);
+    glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, pixels.width(), pixels.height(), 0, GL_RGBA,
+                 GL_UNSIGNED_BYTE, pixels.constBits());
+    textures.insert(key, id);
+    return id;
+}
 
 RkVec3 RkSceneRenderer::Camera::eye() const
 {
@@ -220,8 +264,32 @@ void RkSceneRenderer::draw(const QVector<Item>& items, const Camera& camera, int
             GLfloat diffuse[4];
             colourOf(c, diffuse);
             glMaterialfv(GL_FRONT_AND_BACK, GL_AMBIENT_AND_DIFFUSE, diffuse);
-            glDrawElements(GL_TRIANGLES, cache.groups[i].size(), GL_UNSIGNED_INT,
-                           cache.groups[i].constData());
+            const QImage texture =
+                m < item.materialTextures.size() ? item.materialTextures[m] : QImage();
+            const RkMap* uvMap = g->getUVs();
+            if (texture.isNull() || uvMap->getType() != RkMap::Point2D) {
+                glDrawElements(GL_TRIANGLES, cache.groups[i].size(), GL_UNSIGNED_INT,
+                               cache.groups[i].constData());
+                continue;
+            }
+            // UVs are per corner, so textured facets are sent corner by corner.
+            glEnable(GL_TEXTURE_2D);
+            glBindTexture(GL_TEXTURE_2D, d->textureFor(texture));
+            glTexEnvi(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, GL_MODULATE);
+            const RkPnt2* uv = uvMap->getPnt2ArrayPtr();
+            const RkVec3* normal = d->normals.constData();
+            const QVector<GLuint>& corners = cache.groups[i];
+            const QVector<GLuint>& uvIndex = cache.uvs[i];
+            glBegin(GL_TRIANGLES);
+            for (int k = 0; k < corners.size(); ++k) {
+                const RkVec3& n = normal[corners[k]];
+                const RkVec3& v = p[corners[k]];
+                glNormal3f(n.x, n.y, n.z);
+                glTexCoord2f(uv[uvIndex[k]].x, uv[uvIndex[k]].y);
+                glVertex3f(v.x, v.y, v.z);
+            }
+            glEnd();
+            glDisable(GL_TEXTURE_2D);
         }
         if (item.highlighted && (options & DrawHighlight)) {
             // An outline of the cage over the shaded surface marks the selected node.
@@ -241,6 +309,17 @@ void RkSceneRenderer::draw(const QVector<Item>& items, const Camera& camera, int
     }
     glDisableClientState(GL_NORMAL_ARRAY);
     glDisableClientState(GL_VERTEX_ARRAY);
+
+    // Textures of images no longer drawn go; the context is current here.
+    for (auto it = d->textures.begin(); it != d->textures.end();) {
+        if (d->texturesUsed.contains(it.key())) {
+            ++it;
+            continue;
+        }
+        glDeleteTextures(1, &it.value());
+        it = d->textures.erase(it);
+    }
+    d->texturesUsed.clear();
 
     // Forget geometries that were not drawn this time (they may have been deleted).
     for (auto it = d->triangles.begin(); it != d->triangles.end();) {

@@ -4,14 +4,15 @@
 #include "rkcoreglobal.h"
 
 #include <QColor>
+#include <QImage>
 #include <QMatrix4x4>
 #include <QVector>
 
 class RkGeometry;
 
-// Draws meshes with OpenGL 1.x into the current context: smooth shaded, one colour per material,
-// lit by a key and a fill light. Kept apart from any widget so that the on-screen view and the
-// offscreen renders share one path.
+// Draws meshes with OpenGL 1.x into the current context: smooth shaded, one colour per material
+// (and its texture, where it has one), lit by a key and a fill light. Kept apart from any widget so
+// that the on-screen view and the offscreen renders share one path.
 class RKCORE_EXPORT RkSceneRenderer
 {
 public:
@@ -35,6 +36,8 @@ public:
         const RkGeometry* geometry = nullptr;
         const QVector<RkVec3>* positions = nullptr;
         QVector<QColor> materialColours; // by material index; missing ones are grey
+        // By material index: a picture mapped by the geometry's UVs and tinted by the colour.
+        QVector<QImage> materialTextures;
         bool highlighted = false;
     };
 

@@ -3,6 +3,7 @@
 #include <QtTest>
 
 #include <cmath>
+#include <cstring>
 #include <limits>
 
 namespace
@@ -39,6 +40,8 @@ private Q_SLOTS:
     void morphsAddWeightedOffsets();
     void badMorphEntriesAreDropped();
     void verticesFollowTheirBone();
+    void blendedInfluences();
+    void threadedSkinningIsBitIdentical();
 };
 
 void TestRkMeshDeformer::morphsAddWeightedOffsets()
@@ -110,6 +113,62 @@ void TestRkMeshDeformer::verticesFollowTheirBone()
     d.deform(up, 1, bones, 2, out);
     QVERIFY(near(out[1], RkVec3(1, 0, 0)));
     QVERIFY(near(out[2], RkVec3(-2, 2, 0)));
+}
+
+void TestRkMeshDeformer::blendedInfluences()
+{
+    RkMeshDeformer d;
+    d.setRestPositions({RkVec3(1, 0, 0), RkVec3(0, 1, 0), RkVec3(0, 0, 1)});
+    const float nan = std::numeric_limits<float>::quiet_NaN();
+    // Weights need not sum to 1: they are scaled to.
+    const RkBoneInfluence quarter[2] = {{0, 0.5f}, {1, 1.5f}};
+    QCOMPARE(d.setVertexInfluences(0, quarter, 2), 2);
+    // Five influences: the lightest goes, as do a negative bone, a NaN and a negative weight.
+    const RkBoneInfluence many[8] = {{0, 0.1f},  {1, 0.2f},  {2, 0.3f}, {3, 0.2f},
+                                     {0, 0.05f}, {-1, 5.0f}, {2, nan},  {1, -3.0f}};
+    QCOMPARE(d.setVertexInfluences(1, many, 8), 4);
+    const RkBoneInfluence* kept = d.getVertexInfluences(1);
+    float sum = 0;
+    for (int i = 0; i < RkMeshDeformer::MaxInfluences; ++i) {
+        QVERIFY(kept[i].bone >= 0);
+        QVERIFY(kept[i].weight > 0.05f);
+        sum += kept[i].weight;
+    }
+    QVERIFY(std::fabs(sum - 1.0f) < 1e-6f);
+    const RkBoneInfluence rubbish[2] = {{0, nan}, {-2, 1.0f}};
+    QCOMPARE(d.setVertexInfluences(2, rubbish, 2), 0);
+
+    const RkXform bones[4] = {RkXform::translation(RkVec3(4, 0, 0)),
+                              RkXform::translation(RkVec3(0, 8, 0)), RkXform(), RkXform()};
+    QVector<RkVec3> out;
+    d.deform(nullptr, 0, bones, 4, out);
+    QVERIFY(near(out[0], RkVec3(1 + 4 * 0.25f, 8 * 0.75f, 0)));
+    // Bones 2 and 3 stay put; bone 0 has 0.1 / 0.8 of it, bone 1 0.2 / 0.8.
+    QVERIFY(near(out[1], RkVec3(4 * 0.125f, 1 + 8 * 0.25f, 0)));
+    QVERIFY(near(out[2], RkVec3(0, 0, 1)));
+}
+
+void TestRkMeshDeformer::threadedSkinningIsBitIdentical()
+{
+    const int n = RkMeshDeformer::ThreadedVertexCount + 12345;
+    QVector<RkVec3> rest(n);
+    for (int i = 0; i < n; ++i)
+        rest[i] = RkVec3(std::sin(i * 0.1f), float(i % 97) * 0.01f, std::cos(i * 0.37f));
+    RkMeshDeformer d;
+    d.setRestPositions(rest);
+    for (int i = 0; i < n; ++i) {
+        const RkBoneInfluence inf[3] = {{i % 5, 0.3f}, {(i + 1) % 5, 0.5f}, {(i + 3) % 5, 0.7f}};
+        d.setVertexInfluences(i, inf, 3);
+    }
+    RkXform bones[5];
+    for (int b = 0; b < 5; ++b)
+        bones[b] = RkXform::rotationAbout(RkVec3(0, b * 0.2f, 0), 10.0f * b, 7.0f, -3.0f * b);
+    QVector<RkVec3> threaded, single;
+    d.deform(nullptr, 0, bones, 5, threaded);
+    d.deformSingleThreaded(nullptr, 0, bones, 5, single);
+    QCOMPARE(threaded.size(), n);
+    QVERIFY(std::memcmp(threaded.constData(), single.constData(), sizeof(RkVec3) * n) == 0);
+    QVERIFY(threaded[n - 1] != rest[n - 1]);
 }
 
 QTEST_APPLESS_MAIN(TestRkMeshDeformer)
