@@ -20,10 +20,12 @@
 #include <QApplication>
 #include <QHash>
 #include <QMouseEvent>
-#include <QPair>
 #include <QPointer>
 #include <QScrollBar>
 #include <QStyle>
+
+#include <unordered_map>
+#include <utility>
 
 namespace
 {
@@ -129,6 +131,14 @@ public:
     bool mouseOverSlider = false;
 };
 
+using BuiltKey = std::pair<const RkWidgetGroup*, QString>;
+struct BuiltKeyHash {
+    size_t operator()(const BuiltKey& key) const
+    {
+        return std::hash<const void*>()(key.first) ^ qHash(key.second);
+    }
+};
+
 struct RkGroupState {
     QString path;
     bool collapsed = false;
@@ -166,7 +176,7 @@ struct RkPropertyPaneList::Private {
     QList<QMetaObject::Connection> groupLinks;
     // The first widget of each label in each group in this build, for merging equal properties
     // of several nodes without scanning the group.
-    QHash<QPair<const RkWidgetGroup*, QString>, RkPropertyWgt*> built;
+    std::unordered_map<BuiltKey, RkPropertyWgt*, BuiltKeyHash> built;
     // clear() left the earlier content in place; settle() hides what the build did not take.
     bool unsettled = false;
     bool settlePosted = false;
@@ -309,10 +319,7 @@ void RkPropertyPaneList::clear()
     for (const QMetaObject::Connection& link : qAsConst(d->groupLinks))
         disconnect(link);
     d->groupLinks.clear();
-    // Emptied, not freed: the next build holds as many widgets again.
-    const int built = d->built.size();
-    d->built.clear();
-    d->built.reserve(built);
+    d->built.clear(); // keeps its buckets for the next build
     // Groups and widgets stay shown until the fill is finished: those taken again in the same
     // place cost nothing. Should nobody finish the build, the event loop settles the list.
     d->layout->beginRefill();
@@ -347,8 +354,10 @@ bool RkPropertyPaneList::addPropertyWidget(RkProperty* property, RkWidgetGroup* 
         return first && first->getLabel() == label &&
                QLatin1String(widget->metaObject()->className()) == cls;
     };
-    const auto key = qMakePair(static_cast<const RkWidgetGroup*>(group), label);
-    if (RkPropertyWgt* known = d->built.value(key)) {
+    const BuiltKey key{group, label};
+    const auto found = d->built.find(key);
+    if (found != d->built.end()) {
+        RkPropertyWgt* known = found->second;
         if (group->holdsWidget(known) && sameKind(known)) {
             known->addProperty(property);
             return true;
@@ -363,7 +372,7 @@ bool RkPropertyPaneList::addPropertyWidget(RkProperty* property, RkWidgetGroup* 
             }
         }
         if (!group->holdsWidget(known))
-            d->built.remove(key);
+            d->built.erase(key);
     }
 
     RkWidgetPool* pool = nullptr;
@@ -386,8 +395,7 @@ bool RkPropertyPaneList::addPropertyWidget(RkProperty* property, RkWidgetGroup* 
         widget->setParent(d->centralWidget);
     widget->addProperty(property);
     group->addWidget(widget);
-    if (!d->built.contains(key))
-        d->built.insert(key, widget);
+    d->built.emplace(key, widget); // the first of its label stays
     addToLocalFavorites(property, group);
     return true;
 }
