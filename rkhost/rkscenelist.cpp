@@ -8,30 +8,10 @@
 #include <QHash>
 #include <QMouseEvent>
 #include <QPointer>
-#include <QTimer>
 
-RkSceneList::RkSceneList(QWidget* parent) : QTreeWidget(parent)
+RkSceneList::RkSceneList(QWidget* parent) : RkSceneTreeList(parent, QStringLiteral("SceneList"))
 {
-    setObjectName(QStringLiteral("SceneList"));
-    setHeaderHidden(true);
-    setColumnCount(1);
-    setSelectionMode(QAbstractItemView::NoSelection);
-    setFocusPolicy(Qt::NoFocus);
-
-    connect(rkScene, &RkScene::nodeAdded, this, &RkSceneList::scheduleRebuild);
-    connect(rkScene, &RkScene::nodeRemoved, this, &RkSceneList::scheduleRebuild);
     connect(rkScene, &RkScene::nodeSelectionListChanged, this, &RkSceneList::showSelection);
-    // While a scene loads or clears, one rebuild at the end is enough.
-    connect(rkScene, &RkScene::sceneLoadStarting, this, [this] { m_blocked = true; });
-    connect(rkScene, &RkScene::sceneClearStarting, this, [this] { m_blocked = true; });
-    connect(rkScene, &RkScene::sceneLoaded, this, [this] {
-        m_blocked = false;
-        rebuild();
-    });
-    connect(rkScene, &RkScene::sceneCleared, this, [this] {
-        m_blocked = false;
-        rebuild();
-    });
     rebuild();
 }
 
@@ -77,18 +57,6 @@ void RkSceneList::mousePressEvent(QMouseEvent* event)
     event->accept();
 }
 
-void RkSceneList::scheduleRebuild()
-{
-    if (m_blocked || m_rebuildPending)
-        return;
-    m_rebuildPending = true;
-    QTimer::singleShot(0, this, [this] {
-        m_rebuildPending = false;
-        if (!m_blocked)
-            rebuild();
-    });
-}
-
 void RkSceneList::rebuild()
 {
     clear();
@@ -120,13 +88,10 @@ void RkSceneList::rebuild()
 
 void RkSceneList::showSelection()
 {
-    const QColor highlight = palette().color(QPalette::Highlight);
-    const QColor highlightText = palette().color(QPalette::HighlightedText);
     for (QTreeWidgetItemIterator it(this); *it; ++it) {
         RkNode* node = nodeForItem(*it);
         const bool on = node && node->isSelected();
-        (*it)->setBackground(0, on ? QBrush(highlight) : QBrush());
-        (*it)->setForeground(0, on ? QBrush(highlightText) : QBrush());
+        markSelected(*it, on, palette());
         QFont font = (*it)->font(0);
         font.setBold(node && node == rkScene->getPrimarySelection());
         (*it)->setFont(0, font);

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "rkscenetreelist.h"
 #include <QHash>
 #include <QPointer>
-#include <QTreeWidget>
 
 class RkMainWindow;
 class RkNode;
@@ -10,7 +10,7 @@ class RkNode;
 // The scene's nodes as a tree (figures with their bones). Clicking a node selects it, Ctrl+click
 // adds it to the selection; the highlighted items follow the scene's selection however it
 // changes.
-class RkSceneList : public QTreeWidget
+class RkSceneList : public RkSceneTreeList
 {
     Q_OBJECT
 public:
@@ -24,13 +24,10 @@ protected:
     void mousePressEvent(QMouseEvent* event) override;
 
 private:
-    void scheduleRebuild();
-    void rebuild();
+    void rebuild() override;
     void showSelection();
 
     QHash<const QTreeWidgetItem*, QPointer<RkNode>> m_nodes;
-    bool m_rebuildPending = false;
-    bool m_blocked = false;
     bool m_showingSelection = false;
 };
 

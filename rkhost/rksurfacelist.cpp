@@ -10,29 +10,11 @@
 
 #include <QDockWidget>
 #include <QMouseEvent>
-#include <QTimer>
 
-RkSurfaceList::RkSurfaceList(QWidget* parent) : QTreeWidget(parent)
+RkSurfaceList::RkSurfaceList(QWidget* parent)
+    : RkSceneTreeList(parent, QStringLiteral("SurfaceList"))
 {
-    setObjectName(QStringLiteral("SurfaceList"));
-    setHeaderHidden(true);
-    setColumnCount(1);
-    setSelectionMode(QAbstractItemView::NoSelection);
-    setFocusPolicy(Qt::NoFocus);
-
-    connect(rkScene, &RkScene::nodeAdded, this, &RkSurfaceList::scheduleRebuild);
-    connect(rkScene, &RkScene::nodeRemoved, this, &RkSurfaceList::scheduleRebuild);
     connect(rkScene, &RkScene::materialSelectionChanged, this, &RkSurfaceList::showSelection);
-    connect(rkScene, &RkScene::sceneLoadStarting, this, [this] { m_blocked = true; });
-    connect(rkScene, &RkScene::sceneClearStarting, this, [this] { m_blocked = true; });
-    connect(rkScene, &RkScene::sceneLoaded, this, [this] {
-        m_blocked = false;
-        rebuild();
-    });
-    connect(rkScene, &RkScene::sceneCleared, this, [this] {
-        m_blocked = false;
-        rebuild();
-    });
     rebuild();
 }
 
@@ -78,18 +60,6 @@ void RkSurfaceList::mousePressEvent(QMouseEvent* event)
     event->accept();
 }
 
-void RkSurfaceList::scheduleRebuild()
-{
-    if (m_blocked || m_rebuildPending)
-        return;
-    m_rebuildPending = true;
-    QTimer::singleShot(0, this, [this] {
-        m_rebuildPending = false;
-        if (!m_blocked)
-            rebuild();
-    });
-}
-
 void RkSurfaceList::rebuild()
 {
     clear();
@@ -127,13 +97,10 @@ void RkSurfaceList::rebuild()
 
 void RkSurfaceList::showSelection()
 {
-    const QColor highlight = palette().color(QPalette::Highlight);
-    const QColor highlightText = palette().color(QPalette::HighlightedText);
     for (auto it = m_materials.cbegin(); it != m_materials.cend(); ++it) {
         auto* item = const_cast<QTreeWidgetItem*>(it.key());
         const bool on = it.value() && it.value()->isSelected();
-        item->setBackground(0, on ? QBrush(highlight) : QBrush());
-        item->setForeground(0, on ? QBrush(highlightText) : QBrush());
+        markSelected(item, on, palette());
     }
 }
 

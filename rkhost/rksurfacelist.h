@@ -1,8 +1,8 @@
 #pragma once
 
+#include "rkscenetreelist.h"
 #include <QHash>
 #include <QPointer>
-#include <QTreeWidget>
 
 class RkMainWindow;
 class RkMaterial;
@@ -11,7 +11,7 @@ class RkMaterial;
 // count as the figure). Clicking a material selects it alone, Ctrl+click adds it or takes it out
 // of the selection, a click on empty space clears the material selection; the highlighted items
 // follow the material selection however it changes.
-class RkSurfaceList : public QTreeWidget
+class RkSurfaceList : public RkSceneTreeList
 {
     Q_OBJECT
 public:
@@ -25,13 +25,10 @@ protected:
     void mousePressEvent(QMouseEvent* event) override;
 
 private:
-    void scheduleRebuild();
-    void rebuild();
+    void rebuild() override;
     void showSelection();
 
     QHash<const QTreeWidgetItem*, QPointer<RkMaterial>> m_materials;
-    bool m_rebuildPending = false;
-    bool m_blocked = false;
 };
 
 // Docks a surface list on the left of the main window, below the scene list.

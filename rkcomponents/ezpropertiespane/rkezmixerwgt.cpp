@@ -12,13 +12,14 @@ RkEzMixerWgt::RkEzMixerWgt(QWidget* parent, RkEzMixer* mixer) : QFrame(parent), 
     setContentsMargins(0, 0, style()->pixelMetric(QStyle::PM_CustomBase), 0);
     setFrameStyle(QFrame::StyledPanel | QFrame::Sunken);
     setLineWidth(1);
-    // No layout: children sit at their points. The thumbnails are made after the handle, so
-    // they lie above it until the handle is pressed.
+    // No layout: children sit at their points. The handle stays above the thumbnails: a mixer
+    // saved with its handle on a control would otherwise open with the handle out of reach.
     m_driverWgt = new RkEzMixerDriverWgt(this, mixer ? mixer->getDriver() : nullptr);
     if (mixer) {
         for (RkEzMixerControl* control : mixer->getControls())
             new RkEzMixerControlWgt(this, control);
     }
+    m_driverWgt->raise();
 }
 
 RkEzMixerWgt::~RkEzMixerWgt() = default;
@@ -55,5 +56,6 @@ RkEzMixerControlWgt* RkEzMixerWgt::addControlWgt(RkEzMixerControl* control)
 {
     auto* wgt = new RkEzMixerControlWgt(this, control);
     wgt->show();
+    m_driverWgt->raise();
     return wgt;
 }

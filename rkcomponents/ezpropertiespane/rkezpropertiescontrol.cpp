@@ -1,10 +1,8 @@
 #include "rkezpropertiescontrol.h"
 
 #include "properties/rkfloatproperty.h"
-#include "rksourcewarning.h"
-#include "scene/rkscene.h"
+#include "rkezmorphedit.h"
 #include "undo/rkundostack.h"
-#include "undo/rkundostackhold.h"
 #include "widgets/rkfloatslider.h"
 
 #include <QApplication>
@@ -20,8 +18,6 @@
 #include <QVBoxLayout>
 #include <QVector3D>
 
-#include <cmath>
-
 struct RkEzPropertiesControl::Private {
     RkEzIconGridWgt* grid = nullptr;
     // The morph belongs to its node; the guard turns null when the node deletes it.
@@ -32,13 +28,12 @@ struct RkEzPropertiesControl::Private {
     QLabel* valueLabel = nullptr;
     RkFloatSlider* slider = nullptr;
     float snapshotValue = 0.f;
-    bool previewing = false;
     bool hasImage = false;
     QImage image;
     bool updatingFromProperty = false;
     bool updatingFromSlider = false;
-    // At most one hold: a preview's (previewing set) or a slider gesture's.
-    std::unique_ptr<RkUndoStackHold> hold;
+    // At most one hold: a preview's or a slider gesture's.
+    RkEzMorphEdit edit;
     bool pointerOverImage = false;
     bool pressed = false;
     QPoint pressPos;
@@ -125,10 +120,7 @@ RkEzPropertiesControl::~RkEzPropertiesControl()
     d->labelFrame->removeEventFilter(this);
     // A tile removed in the middle of a gesture keeps what the gesture did, as a hidden slider
     // does, and a preview goes back: either way the undo stack is free again.
-    if (d->previewing)
-        endPreview();
-    else if (d->hold)
-        editEnd();
+    d->edit.close(d->property);
 }
 
 RkEzIconGridWgt* RkEzPropertiesControl::getGrid() const
@@ -158,13 +150,7 @@ void RkEzPropertiesControl::updateInternalSlider()
     if (!d->property)
         return;
     d->nameLabel->setText(d->property->getLabel());
-    const QSignalBlocker blocker(d->slider);
-    d->slider->setClamped(d->property->isClamped());
-    d->slider->setMinMax(d->property->getMin(), d->property->getMax());
-    d->slider->setDisplayAsPercent(d->property->getDisplayAsPercent());
-    d->slider->setValue(d->property->getValue());
-    d->slider->setSensitivity(d->property->getSensitivity());
-    d->slider->update();
+    RkEzMorphEdit::configure(d->slider, d->property);
 }
 
 void RkEzPropertiesControl::sliderValueChanged(float value)
@@ -177,80 +163,38 @@ void RkEzPropertiesControl::sliderValueChanged(float value)
 
 void RkEzPropertiesControl::editStart()
 {
-    if (d->hold) {
-        RK_SOURCE_WARNING(
-            QStringLiteral("Undo Stack already being held in RkEzPropertiesControl::editStart()!"));
-        d->hold.reset();
-        d->previewing = false;
-    }
-    if (!d->property)
-        return;
-    d->hold = std::make_unique<RkUndoStackHold>();
-    d->property->beginEdit();
+    d->edit.start(d->property, "RkEzPropertiesControl::editStart()");
 }
 
 void RkEzPropertiesControl::editEnd()
 {
-    if (d->property)
-        d->property->finishEdit();
-    if (d->hold) {
-        const QString label = d->property ? d->property->getLabel() : QString();
-        d->hold->accept(label.isEmpty() ? tr("Unnamed") : label);
-        d->hold.reset();
-    }
+    d->edit.end(d->property);
 }
 
 void RkEzPropertiesControl::editCancelled()
 {
-    if (d->property)
-        d->property->cancelEdit();
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.cancel(d->property);
 }
 
 void RkEzPropertiesControl::beginPreview()
 {
-    if (d->previewing || d->hold || !d->property || (rkScene && rkScene->isPlaying()))
-        return;
-    // Also false for a value that is not a number. A morph at half strength or more is not
-    // previewed: the preview would show little that is new.
-    if (!(std::abs(d->property->getValue()) < 0.5f))
-        return;
-    d->previewing = true;
-    d->hold = std::make_unique<RkUndoStackHold>();
-    d->property->beginEdit();
-    d->property->adjustValue(1.f);
+    d->edit.beginPreview(d->property);
 }
 
 void RkEzPropertiesControl::endPreview()
 {
-    if (!d->previewing)
-        return;
-    d->previewing = false;
-    // cancelEdit() puts the value back; cancelling the hold leaves nothing on the stack.
-    if (d->property)
-        d->property->cancelEdit();
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.endPreview(d->property);
 }
 
 bool RkEzPropertiesControl::isPreviewing() const
 {
-    return d->previewing;
+    return d->edit.isPreviewing();
 }
 
 void RkEzPropertiesControl::propertyDestroyed()
 {
     // The property is gone already: drop the hold without touching it, then show nothing of it.
-    d->previewing = false;
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.drop();
     d->hasImage = false;
     d->image = QImage();
     d->nameLabel->clear();

@@ -2,10 +2,8 @@
 
 #include "properties/rkfloatproperty.h"
 #include "rkezcompressedslider.h"
-#include "rksourcewarning.h"
-#include "scene/rkscene.h"
+#include "rkezmorphedit.h"
 #include "undo/rkundostack.h"
-#include "undo/rkundostackhold.h"
 #include "widgets/rkfloatpropertywgt.h"
 
 #include <QEvent>
@@ -13,8 +11,6 @@
 #include <QLabel>
 #include <QPainter>
 #include <QPointer>
-
-#include <cmath>
 
 struct RkEzPropertiesSlider::Private {
     QWidget* owner = nullptr;
@@ -24,11 +20,10 @@ struct RkEzPropertiesSlider::Private {
     RkFloatPropertyWgt* propertyWgt = nullptr;
     QLabel* nameLabel = nullptr;
     RkEzCompressedSlider* slider = nullptr;
-    bool previewing = false;
     bool updatingFromProperty = false;
     bool updatingFromSlider = false;
-    // At most one hold: a preview's (previewing set) or a slider gesture's.
-    std::unique_ptr<RkUndoStackHold> hold;
+    // At most one hold: a preview's or a slider gesture's.
+    RkEzMorphEdit edit;
     bool hovered = false;
 };
 
@@ -91,10 +86,7 @@ RkEzPropertiesSlider::~RkEzPropertiesSlider()
     d->nameLabel->removeEventFilter(this);
     // A row removed in the middle of a gesture keeps what the gesture did, as a hidden slider
     // does, and a preview goes back: either way the undo stack is free again.
-    if (d->previewing)
-        endPreview();
-    else if (d->hold)
-        editEnd();
+    d->edit.close(d->property);
 }
 
 QWidget* RkEzPropertiesSlider::getOwner() const
@@ -149,13 +141,7 @@ void RkEzPropertiesSlider::updateInternalSlider()
     if (!d->property)
         return;
     showLabel();
-    const QSignalBlocker blocker(d->slider);
-    d->slider->setClamped(d->property->isClamped());
-    d->slider->setMinMax(d->property->getMin(), d->property->getMax());
-    d->slider->setDisplayAsPercent(d->property->getDisplayAsPercent());
-    d->slider->setValue(d->property->getValue());
-    d->slider->setSensitivity(d->property->getSensitivity());
-    d->slider->update();
+    RkEzMorphEdit::configure(d->slider, d->property);
 }
 
 void RkEzPropertiesSlider::sliderValueChanged(float value)
@@ -168,79 +154,38 @@ void RkEzPropertiesSlider::sliderValueChanged(float value)
 
 void RkEzPropertiesSlider::editStart()
 {
-    if (d->hold) {
-        RK_SOURCE_WARNING(
-            QStringLiteral("Undo Stack already being held in RkEzPropertiesSlider::editStart()!"));
-        d->hold.reset();
-        d->previewing = false;
-    }
-    if (!d->property)
-        return;
-    d->hold = std::make_unique<RkUndoStackHold>();
-    d->property->beginEdit();
+    d->edit.start(d->property, "RkEzPropertiesSlider::editStart()");
 }
 
 void RkEzPropertiesSlider::editEnd()
 {
-    if (d->property)
-        d->property->finishEdit();
-    if (d->hold) {
-        const QString label = d->property ? d->property->getLabel() : QString();
-        d->hold->accept(label.isEmpty() ? tr("Unnamed") : label);
-        d->hold.reset();
-    }
+    d->edit.end(d->property);
 }
 
 void RkEzPropertiesSlider::editCancelled()
 {
-    if (d->property)
-        d->property->cancelEdit();
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.cancel(d->property);
 }
 
 void RkEzPropertiesSlider::beginPreview()
 {
-    if (d->previewing || d->hold || !d->property || (rkScene && rkScene->isPlaying()))
-        return;
-    // Also false for a value that is not a number; a morph at half strength or more is not
-    // previewed.
-    if (!(std::abs(d->property->getValue()) < 0.5f))
-        return;
-    d->previewing = true;
-    d->hold = std::make_unique<RkUndoStackHold>();
-    d->property->beginEdit();
-    d->property->adjustValue(1.f);
+    d->edit.beginPreview(d->property);
 }
 
 void RkEzPropertiesSlider::endPreview()
 {
-    if (!d->previewing)
-        return;
-    d->previewing = false;
-    if (d->property)
-        d->property->cancelEdit();
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.endPreview(d->property);
 }
 
 bool RkEzPropertiesSlider::isPreviewing() const
 {
-    return d->previewing;
+    return d->edit.isPreviewing();
 }
 
 void RkEzPropertiesSlider::propertyDestroyed()
 {
     // The property is gone already: drop the hold without touching it, then show nothing of it.
-    d->previewing = false;
-    if (d->hold) {
-        d->hold->cancel();
-        d->hold.reset();
-    }
+    d->edit.drop();
     d->hovered = false;
     d->nameLabel->clear();
     // Hiding ends a running slider gesture, which finds nothing left to do.

@@ -288,9 +288,13 @@ void RkPropertiesPane::layoutChildren()
     const int r = customMetric(this, 10);
     const int dividerHeight = customMetric(this, 17);
 
-    d->selectedItemCaption->setGeometry(m, m, 80, r);
-    // The label starts at 80, not after the margin: it overlaps the caption's right edge.
-    d->selectedItemLabel->setGeometry(80, m, w - 2 * m - 80, r);
+    // The caption is 80 wide and the name starts at 80, overlapping the caption's margin; a font
+    // whose caption text needs more room widens the caption and moves the name after it.
+    const int textWidth = d->selectedItemCaption->sizeHint().width();
+    const int captionWidth = qMax(80, textWidth);
+    const int labelX = m + textWidth <= 80 ? 80 : m + textWidth + m;
+    d->selectedItemCaption->setGeometry(m, m, captionWidth, r);
+    d->selectedItemLabel->setGeometry(labelX, m, qMax(w - 2 * m - labelX, 0), r);
 
     int y = 2 * m + r;
     if (!d->favsMinimized) {

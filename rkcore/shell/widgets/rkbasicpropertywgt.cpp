@@ -5,6 +5,7 @@
 #include "widgets/rkslider.h"
 
 #include <QHBoxLayout>
+#include <QMouseEvent>
 #include <QPointer>
 #include <QStyle>
 
@@ -55,6 +56,17 @@ void RkBasicPropertyWgt::removeAllProperties()
 bool RkBasicPropertyWgt::doOptionsDialog()
 {
     return false;
+}
+
+void RkBasicPropertyWgt::mouseDoubleClickEvent(QMouseEvent* event)
+{
+    // The slider keeps double-clicks on its bar and value; one on the label reaches here.
+    if (event->button() == Qt::LeftButton && !getProperties().isEmpty()) {
+        event->accept();
+        doOptionsDialog();
+        return;
+    }
+    RkPropertyWgt::mouseDoubleClickEvent(event);
 }
 
 void RkBasicPropertyWgt::beginPropertyEdit()

@@ -24,6 +24,7 @@ public:
     virtual bool doOptionsDialog();
 
 protected:
+    void mouseDoubleClickEvent(QMouseEvent* event) override;
     void enterEvent(QEvent* event) override;
     void leaveEvent(QEvent* event) override;
 

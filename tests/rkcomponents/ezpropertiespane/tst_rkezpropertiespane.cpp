@@ -9,6 +9,7 @@
 #include "rkezicongridwgt.h"
 #include "rkezmixer.h"
 #include "rkezmixercontrol.h"
+#include "rkezmixerdriver.h"
 #include "rkezmixers.h"
 #include "rkezmixersetup.h"
 #include "rkezmixerwgt.h"
@@ -19,6 +20,7 @@
 #include "rkezpropertieswgt.h"
 #include "rkeztabbar.h"
 #include "rktestmain.h"
+#include "scene/rkbone.h"
 #include "scene/rkscene.h"
 #include "scene/rkskeleton.h"
 #include "undo/rkundostack.h"
@@ -34,6 +36,7 @@
 #include <QStackedLayout>
 #include <QStandardItemModel>
 #include <QTemporaryDir>
+#include <QWindow>
 #include <QtEndian>
 
 namespace
@@ -169,12 +172,14 @@ private Q_SLOTS:
     void categoriesSkipGeneralAndDeformers();
     void pagingTexts();
     void droppedTilesFillMixers();
+    void bonesKeepMixersAndTabsReselect();
     void figureLeavingTheSceneRebuilds();
     void newNodeAtTheSameAddressRebuilds();
     void deleteFromAStaleMenuDoesNothing();
     void filterFindsMorphsByLabel();
     void switchingCategoriesLeavesNoWidgets();
     void storedMixerForm();
+    void droppedMixerDrivesAcrossSaveAndOpen();
 
 private:
     RkEzPropertiesWgt* wgt() const { return m_pane->getPropertiesWgt(); }
@@ -392,6 +397,38 @@ void TestRkEzPropertiesPane::droppedTilesFillMixers()
              QPoint(168, 127));
 }
 
+void TestRkEzPropertiesPane::bonesKeepMixersAndTabsReselect()
+{
+    drop(wgt()->getCurrentPage()->getIconGrid()->getTiles().value(0));
+    QPointer<RkEzMixerWgt> page = wgt()->getMixerPages().value(0);
+    QVERIFY(page);
+    for (RkBone* bone : {m_figure->findBone("chest"), m_figure->findBone("neck")}) {
+        QVERIFY(bone);
+        const int before = wgt()->getRebuildCount();
+        rkScene->selectNode(bone);
+        QTRY_COMPARE(wgt()->getRebuildCount(), before + 1);
+        // Same figure: the mixer pages stay as they were.
+        QCOMPARE(wgt()->getMixerPages().value(0), page.data());
+        QCOMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"Mixer 1", "+"}));
+    }
+
+    // A click on the still drawn tab of the row that is not active shows its page again.
+    RkEzTabBar* upper = wgt()->getUpperTabs();
+    RkEzTabBar* lower = wgt()->getLowerTabs();
+    for (int round = 0; round < 2; ++round) {
+        QTest::mouseClick(lower, Qt::LeftButton, {}, lower->tabRect(0).center());
+        QTRY_VERIFY(page->isVisible());
+        QCOMPARE(upper->currentIndex(), -1);
+        QTest::mouseClick(upper, Qt::LeftButton, {}, upper->tabRect(0).center());
+        QTRY_VERIFY(wgt()->getCurrentPage()->isVisible());
+        QVERIFY(!page->isVisible());
+        QCOMPARE(lower->currentIndex(), -1);
+    }
+
+    rkScene->selectNode(rkScene->findNode(QLatin1String(RkDemoPropName)));
+    QTRY_COMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"+"}));
+}
+
 void TestRkEzPropertiesPane::figureLeavingTheSceneRebuilds()
 {
     // A tile previews its morph while hovered; then the figure goes.
@@ -571,6 +608,63 @@ void TestRkEzPropertiesPane::storedMixerForm()
     }
     QCOMPARE(controls, 2);
     QCOMPARE(drivers, 1);
+}
+
+void TestRkEzPropertiesPane::droppedMixerDrivesAcrossSaveAndOpen()
+{
+    choose(0, QStringLiteral("Morphs"));
+    const QVector<RkEzPropertiesControl*> tiles =
+        wgt()->getCurrentPage()->getIconGrid()->getTiles();
+    QVERIFY(tiles.size() >= 2);
+    const QString first = tiles[0]->getProperty()->getName();
+    const QString second = tiles[1]->getProperty()->getName();
+    drop(tiles[0]);
+    drop(tiles[1]);
+
+    // Drags the shown mixer's handle onto one of its controls; that control's morph goes to full
+    // strength, the other's to zero. After the open the handle starts on the second control,
+    // where it must still be within reach.
+    const QStringList names = {first, second};
+    auto driveTo = [this, &names](RkNode* figure, int control) {
+        RkEzTabBar* lower = wgt()->getLowerTabs();
+        QTest::mouseClick(lower, Qt::LeftButton, {}, lower->tabRect(0).center());
+        RkEzMixerWgt* page = wgt()->getMixerPages().value(0);
+        QTRY_VERIFY(page && page->isVisible());
+        QCOMPARE(page->getControlWgts().size(), 2);
+        RkEzMixerControl* target = page->getMixer()->getControls().value(control);
+        // Through the pane's window, as the window system would send them: the pane shares the
+        // screen with the main window, so cursor moves must not depend on what lies on top.
+        QWindow* window = page->window()->windowHandle();
+        const QPoint from = page->mapTo(page->window(), page->getMixer()->getDriver()->getPoint());
+        const QPoint to = page->mapTo(page->window(), QPoint(target->getX(), target->getY()));
+        QVERIFY(from != to);
+        QTest::mousePress(window, Qt::LeftButton, {}, from);
+        QTest::mouseMove(window, (from + to) / 2);
+        QTest::mouseMove(window, to);
+        QTest::mouseRelease(window, Qt::LeftButton, {}, to);
+        for (int i = 0; i < 2; ++i) {
+            auto* morph = qobject_cast<RkFloatProperty*>(figure->findProperty(names[i]));
+            QVERIFY(morph);
+            QVERIFY2(qAbs(morph->getValue() - (i == control ? 1.f : 0.f)) < 1e-3f,
+                     qPrintable(names[i] + QString::number(morph->getValue())));
+        }
+    };
+    driveTo(m_figure, 1);
+    if (QTest::currentTestFailed())
+        return;
+
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("mixed.rks"));
+    QVERIFY(rkScene->save(path));
+    rkScene->clear();
+    QVERIFY(rkScene->load(path));
+    auto* figure = qobject_cast<RkSkeleton*>(rkScene->findNode(QLatin1String(RkDemoFigureName)));
+    QVERIFY(figure);
+    m_figure = figure;
+    rkScene->selectNode(figure);
+    QTRY_COMPARE(wgt()->getFigure(), static_cast<RkNode*>(figure));
+    QTRY_COMPARE(tabTexts(wgt()->getLowerTabs()), QStringList({"Mixer 1", "+"}));
+    driveTo(figure, 0);
 }
 
 RK_TEST_MAIN(TestRkEzPropertiesPane)

@@ -178,6 +178,11 @@ void TestRkPropertiesPane::followsSelectionWithOneRebuild()
     QCoreApplication::processEvents();
     QCOMPARE(rebuilds.count(), 1);
     QCOMPARE(caption(), QStringLiteral("Demo Figure : ") + m_bone->getLabel());
+    // Neither text is cut by the other, whatever the font.
+    const QLabel* captionLabel = pane()->findChildren<QLabel*>().at(0);
+    QVERIFY(captionLabel->width() >= captionLabel->sizeHint().width());
+    QVERIFY(pane()->findChildren<QLabel*>().at(1)->x() >=
+            captionLabel->x() + captionLabel->sizeHint().width());
     QVERIFY(pane()->getFavoritesList()->isVisible());
     QVERIFY(pane()->getFavoritesList()->getGroup(QStringLiteral("Figure Favorites"), false));
 
@@ -420,9 +425,10 @@ void TestRkPropertiesPane::filterListsMatchingProperties()
     QCoreApplication::processEvents();
     RkPropertyPaneList* list = pane()->getPropertiesList();
     m_window->resize(1024, 400);
-    QTest::qWait(50);
     QScrollBar* scroll = list->verticalScrollBar();
-    QVERIFY(scroll->maximum() > 0);
+    QTRY_VERIFY(scroll->maximum() > 0);
+    // The user scrolls once the list has settled (its posted scroll event included).
+    QCoreApplication::processEvents();
     scroll->setValue(scroll->maximum());
     const int remembered = scroll->value();
     RkProperty* xRotate = m_bone->findProperty(QStringLiteral("XRotate"));
@@ -437,9 +443,8 @@ void TestRkPropertiesPane::filterListsMatchingProperties()
     QCOMPARE(scroll->value(), 0);
 
     field->clear();
-    QTest::qWait(50);
-    QVERIFY(widgetOf(list, yRotate));
-    QCOMPARE(scroll->value(), remembered);
+    QTRY_VERIFY(widgetOf(list, yRotate));
+    QTRY_COMPARE(scroll->value(), remembered);
 }
 
 RK_TEST_MAIN(TestRkPropertiesPane)

@@ -99,6 +99,8 @@ private Q_SLOTS:
     void bounds();
     void drawnImage();
     void fastPathDrawsTheSamePixels();
+    void fastPathOnGrids_data();
+    void fastPathOnGrids();
     void zoomPanAndFrame();
 };
 
@@ -303,6 +305,83 @@ void TestRkUVWgt::fastPathDrawsTheSamePixels()
     const QImage fast = fbo.toImage();
     qDeleteAll(sets);
     QVERIFY(reference != QImage(256, 192, reference.format()));
+    QCOMPARE(fast, reference);
+}
+
+void TestRkUVWgt::fastPathOnGrids_data()
+{
+    QTest::addColumn<int>("cols");
+    QTest::addColumn<int>("rows");
+    QTest::addColumn<int>("size");
+    QTest::addColumn<float>("zoom");
+    QTest::addColumn<float>("centre");
+    QTest::addColumn<float>("jitter");
+    // Shared edges run both ways; lattices whose points fall on pixel edges and centres, and
+    // jittered points with triangles, catch a path whose lines start or end differently.
+    QTest::newRow("coarse") << 40 << 40 << 256 << 0.9f << 0.5f << 0.0f;
+    QTest::newRow("coarse, jittered") << 40 << 40 << 256 << 0.9f << 0.5013f << 0.3f;
+    QTest::newRow("odd, triangles") << 97 << 61 << 256 << 1.37f << 0.5013f << 0.8f;
+    QTest::newRow("sub-pixel") << 300 << 300 << 256 << 0.9f << 0.5f << 0.0f;
+    QTest::newRow("pixel lattice") << 256 << 256 << 256 << 1.0f << 0.5f << 0.0f;
+    QTest::newRow("pixel lattice, triangles") << 256 << 256 << 256 << 0.9f << 0.5f << 0.8f;
+    QTest::newRow("half-pixel lattice, triangles") << 512 << 512 << 256 << 1.0f << 0.5f << 0.8f;
+}
+
+void TestRkUVWgt::fastPathOnGrids()
+{
+    QFETCH(int, cols);
+    QFETCH(int, rows);
+    QFETCH(int, size);
+    QFETCH(float, zoom);
+    QFETCH(float, centre);
+    QFETCH(float, jitter);
+    QOffscreenSurface surface;
+    surface.create();
+    QOpenGLContext context;
+    QVERIFY(context.create());
+    QVERIFY(context.makeCurrent(&surface));
+    QOpenGLFramebufferObject fbo(size, size);
+    QVERIFY(fbo.bind());
+    glViewport(0, 0, size, size);
+    RkUVRenderer::initialize();
+    // A grid with a third of its points moved by up to jitter / 2 cells; with a large jitter,
+    // every third cell is split into two triangles.
+    std::mt19937 random(11);
+    std::uniform_real_distribution<float> shake(-0.5f, 0.5f);
+    RkPolyMesh mesh;
+    for (int r = 0; r <= rows; ++r) {
+        for (int c = 0; c <= cols; ++c) {
+            mesh.addVertex(RkVec3(0, 0, 0));
+            const float j = random() % 3 == 0 ? jitter : 0.0f;
+            mesh.addUV((float(c) + j * shake(random)) / float(cols),
+                       (float(r) + j * shake(random)) / float(rows));
+        }
+    }
+    for (int r = 0; r < rows; ++r)
+        for (int c = 0; c < cols; ++c) {
+            const int a = r * (cols + 1) + c;
+            if (jitter > 0.5f && (r + c) % 3 == 0) {
+                RkTriFacet t;
+                const int t1[3] = {a, a + 1, a + cols + 2};
+                for (int i = 0; i < 3; ++i)
+                    t.vertices[i] = t.uvs[i] = t1[i];
+                mesh.addTri(t);
+                const int t2[3] = {a, a + cols + 2, a + cols + 1};
+                for (int i = 0; i < 3; ++i)
+                    t.vertices[i] = t.uvs[i] = t2[i];
+                mesh.addTri(t);
+            } else {
+                addQuad(mesh, a, a + 1, a + cols + 2, a + cols + 1, quint8((r + c) % 4));
+            }
+        }
+    QList<RkUVSet*> sets = {new RkUVSet(&mesh)};
+    for (int i = 0; i < rows * cols; i += 13)
+        sets[0]->setPolygonSelected(i, true);
+    RkUVRenderer::paint(sets, size, size, centre, centre, zoom, RkUVRenderer::Reference);
+    const QImage reference = fbo.toImage();
+    RkUVRenderer::paint(sets, size, size, centre, centre, zoom, RkUVRenderer::Arrays);
+    const QImage fast = fbo.toImage();
+    qDeleteAll(sets);
     QCOMPARE(fast, reference);
 }
 

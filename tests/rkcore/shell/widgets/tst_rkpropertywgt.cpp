@@ -413,13 +413,22 @@ void TestRkPropertyWgt::optionsDialogValidatesAndAppliesOnce()
     QCOMPARE(props[2]->getValue(), 0.25f);
     QVERIFY(props[0]->isHidden() && props[0]->getMax() == 0.25f);
 
-    // Cancel changes nothing, whatever the fields say.
-    onDialog([](QDialog* dialog) {
+    // Cancel changes nothing, whatever the fields say. A double-click on the label opens the
+    // dialog; one on the value does not.
+    bool opened = false;
+    onDialog([&opened](QDialog* dialog) {
+        opened = true;
         fill(dialog, "MinEdit", QStringLiteral("-5"));
         fill(dialog, "LabelEdit", QStringLiteral("Other"));
         press(dialog, QDialogButtonBox::Cancel);
     });
-    QVERIFY(!widget->doOptionsDialog());
+    QTest::mouseDClick(slider, Qt::LeftButton, {}, QPoint(4, 4));
+    QVERIFY(opened);
+    opened = false;
+    onDialog([&opened](QDialog*) { opened = true; });
+    QTest::mouseDClick(slider, Qt::LeftButton, {}, QPoint(slider->width() - 4, 4));
+    QCoreApplication::processEvents();
+    QVERIFY(!opened);
     QCOMPARE(props[0]->getLabel(), QStringLiteral("Bend More"));
     QCOMPARE(props[0]->getMin(), 0.0f);
     QCOMPARE(rkUndoStack->count(), 1);
