@@ -225,8 +225,9 @@ void RkPropertiesPane::rebuildNodeList()
 
 void RkPropertiesPane::rebuildLists()
 {
-    d->propertiesList->hide();
-    d->favoritesList->hide();
+    // The lists stay shown while they are rebuilt: hiding and showing them would visit every
+    // widget, while a widget that comes back in its place costs nothing. Nothing is drawn before
+    // the event loop runs again, after the build.
     d->favoritesDivider->hide();
     RkApp::setBusyCursor();
 
@@ -275,6 +276,7 @@ void RkPropertiesPane::rebuildLists()
 
     if (RkWidgetGroup* group = d->favoritesList->getGroup(figureFavorites, false))
         group->setCollapsed(d->figureFavsCollapsed);
+    Q_EMIT listsRebuilt();
     RkApp::clearBusyCursor();
 }
 

@@ -53,6 +53,8 @@ public Q_SLOTS:
 Q_SIGNALS:
     void showingHiddenChanged(bool onOff);
     void mouseOverSliderChanged(bool onOff);
+    // After each rebuild of the lists (a selection change, a refresh).
+    void listsRebuilt();
 
 protected:
     bool event(QEvent* event) override;

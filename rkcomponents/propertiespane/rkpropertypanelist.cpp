@@ -18,10 +18,14 @@
 #include "widgets/rkwidgetlistlayout.h"
 
 #include <QApplication>
+#include <QHash>
 #include <QMouseEvent>
 #include <QPointer>
 #include <QScrollBar>
 #include <QStyle>
+
+#include <unordered_map>
+#include <utility>
 
 namespace
 {
@@ -29,6 +33,7 @@ namespace
 const QString LocalFavorites = QStringLiteral("Local Favorites");
 const QString FigureFavorites = QStringLiteral("Figure Favorites");
 const QString LabelWidgetClass = QStringLiteral("RkLabelPropertyWgt");
+const QEvent::Type SettleEventType = QEvent::Type(QEvent::registerEventType());
 
 // A pool holds at most this many widgets plus one.
 constexpr int MaxPoolIndex = 768;
@@ -64,6 +69,8 @@ void setMouseOver(QWidget* widget, bool on)
 
 // The editor widgets of one class. Widgets are handed out in creation order and all come back
 // at once; they are never deleted while the list lives (the list's content widget owns them).
+// A returned widget stays where it was, shown, so that a list filled alike puts it back in place
+// at no cost; the list hides what it did not take back when the fill is finished.
 class RkWidgetPool
 {
 public:
@@ -78,7 +85,6 @@ public:
     {
         for (int i = 0; i < used; ++i) {
             auto* widget = static_cast<RkPropertyWgt*>(widgets[i]);
-            widget->hide();
             widget->removeAllProperties();
             widget->setSelected(false);
         }
@@ -125,6 +131,14 @@ public:
     bool mouseOverSlider = false;
 };
 
+using BuiltKey = std::pair<const RkWidgetGroup*, QString>;
+struct BuiltKeyHash {
+    size_t operator()(const BuiltKey& key) const
+    {
+        return std::hash<const void*>()(key.first) ^ qHash(key.second);
+    }
+};
+
 struct RkGroupState {
     QString path;
     bool collapsed = false;
@@ -160,6 +174,12 @@ struct RkPropertyPaneList::Private {
     std::vector<std::unique_ptr<RkWidgetPool>> pools;
     // Each widget group forwards its folding to the property groups it shows in this build only.
     QList<QMetaObject::Connection> groupLinks;
+    // The first widget of each label in each group in this build, for merging equal properties
+    // of several nodes without scanning the group.
+    std::unordered_map<BuiltKey, RkPropertyWgt*, BuiltKeyHash> built;
+    // clear() left the earlier content in place; settle() hides what the build did not take.
+    bool unsettled = false;
+    bool settlePosted = false;
 
     std::vector<std::unique_ptr<RkListViewState>> viewStates;
     RkListViewState* currentViewState = nullptr;
@@ -284,6 +304,8 @@ RkWidgetGroup* RkPropertyPaneList::getGroup(const QString& path, bool create)
             d->groups.append(match);
         }
     }
+    if (match->isHidden())
+        d->layout->aboutToShow();
     match->show();
     return rest.isEmpty() ? match : match->getGroup(rest, create);
 }
@@ -297,9 +319,16 @@ void RkPropertyPaneList::clear()
     for (const QMetaObject::Connection& link : qAsConst(d->groupLinks))
         disconnect(link);
     d->groupLinks.clear();
-    for (RkWidgetGroup* group : qAsConst(d->groups)) {
-        group->removeAllChildren();
-        group->setActive(false);
+    d->built.clear(); // keeps its buckets for the next build
+    // Groups and widgets stay shown until the fill is finished: those taken again in the same
+    // place cost nothing. Should nobody finish the build, the event loop settles the list.
+    d->layout->beginRefill();
+    for (RkWidgetGroup* group : qAsConst(d->groups))
+        group->release();
+    d->unsettled = true;
+    if (!d->settlePosted) {
+        d->settlePosted = true;
+        QApplication::postEvent(this, new QEvent(SettleEventType));
     }
     d->localFavorites.clear();
     d->figureFavorites.clear();
@@ -316,19 +345,34 @@ bool RkPropertyPaneList::addPropertyWidget(RkProperty* property, RkWidgetGroup* 
         return false;
     }
 
-    // The same property of several nodes shares one widget.
+    // The same property of several nodes shares one widget: the group's first widget of the
+    // property's class whose first property has the same label.
     const QString cls = property->widgetClassName();
     const QString label = property->getLabel();
-    QListIterator<QWidget*> it = group->widgetListIterator();
-    while (it.hasNext()) {
-        auto* widget = qobject_cast<RkPropertyWgt*>(it.next());
-        if (!widget || QLatin1String(widget->metaObject()->className()) != cls)
-            continue;
+    const auto sameKind = [&cls, &label](const RkPropertyWgt* widget) {
         const RkProperty* first = widget->getFirstProperty();
-        if (first && first->getLabel() == label) {
-            widget->addProperty(property);
+        return first && first->getLabel() == label &&
+               QLatin1String(widget->metaObject()->className()) == cls;
+    };
+    const BuiltKey key{group, label};
+    const auto found = d->built.find(key);
+    if (found != d->built.end()) {
+        RkPropertyWgt* known = found->second;
+        if (group->holdsWidget(known) && sameKind(known)) {
+            known->addProperty(property);
             return true;
         }
+        // Another class under the same label, or the group was emptied since: look it over.
+        QListIterator<QWidget*> it = group->widgetListIterator();
+        while (it.hasNext()) {
+            auto* widget = qobject_cast<RkPropertyWgt*>(it.next());
+            if (widget && sameKind(widget)) {
+                widget->addProperty(property);
+                return true;
+            }
+        }
+        if (!group->holdsWidget(known))
+            d->built.erase(key);
     }
 
     RkWidgetPool* pool = nullptr;
@@ -345,9 +389,13 @@ bool RkPropertyPaneList::addPropertyWidget(RkProperty* property, RkWidgetGroup* 
     auto* widget = static_cast<RkPropertyWgt*>(pool->acquire(this));
     if (!widget)
         return false;
-    widget->setParent(d->centralWidget);
+    // A new widget takes the list's font and style before it sizes its contents; a pooled one
+    // stays in the group that last showed it until another group takes it.
+    if (!widget->parentWidget())
+        widget->setParent(d->centralWidget);
     widget->addProperty(property);
     group->addWidget(widget);
+    d->built.emplace(key, widget); // the first of its label stays
     addToLocalFavorites(property, group);
     return true;
 }
@@ -525,6 +573,7 @@ void RkPropertyPaneList::finishBuild()
         favorites->setActive(false);
     }
 
+    settle();
     d->centralWidget->setMinimumSize(d->layout->minimumSize());
     d->centralWidget->updateGeometry();
 }
@@ -764,9 +813,26 @@ void RkPropertyPaneList::restoreViewState()
     }
 }
 
+void RkPropertyPaneList::settle()
+{
+    if (!d->unsettled)
+        return;
+    d->unsettled = false;
+    for (RkWidgetGroup* group : qAsConst(d->groups))
+        group->settle();
+    d->layout->endRefill();
+}
+
 void RkPropertyPaneList::customEvent(QEvent* event)
 {
-    if (event->type() == RkPropertyPaneListScrollEvent::EventType)
+    if (event->type() == SettleEventType) {
+        d->settlePosted = false;
+        if (d->unsettled) {
+            settle();
+            d->centralWidget->setMinimumSize(d->layout->minimumSize());
+            d->centralWidget->updateGeometry();
+        }
+    } else if (event->type() == RkPropertyPaneListScrollEvent::EventType)
         verticalScrollBar()->setSliderPosition(
             static_cast<RkPropertyPaneListScrollEvent*>(event)->position());
     else

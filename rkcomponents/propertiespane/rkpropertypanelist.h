@@ -28,7 +28,9 @@ public:
     RkPropertyPaneList(QWidget* parent, const QString& name);
     ~RkPropertyPaneList() override;
 
-    // Hands every widget back to its pool and deactivates every group.
+    // Hands every widget back to its pool and deactivates every group. What the list showed stays
+    // in place for the next fill to take back; finishBuild() hides the rest (or, without one, the
+    // event loop does).
     virtual void clear();
 
     void setShowFavorites(bool on);
@@ -85,6 +87,7 @@ private:
     bool addFigureFavoriteGroup(RkPropertyGroup* group, RkNode* node);
     bool addGroupFigureFavorites(RkPropertyGroup* group, RkNode* node);
     bool moveGroupToEnd(RkWidgetGroup* group);
+    void settle();
     void select(RkPropertyWgt* widget, bool on);
     void selectRange(RkPropertyWgt* a, RkPropertyWgt* b);
     // Calls visit for each widget of the active groups, sub-groups first, until it returns true.

@@ -86,6 +86,7 @@ void RkFloatProperty::setMinMax(float min, float max)
     m_min = min;
     m_max = max;
     Q_EMIT minMaxChanged();
+    Q_EMIT changed();
 }
 
 float RkFloatProperty::getSensitivity() const
@@ -110,6 +111,7 @@ void RkFloatProperty::setDisplayAsPercent(bool on)
         return;
     m_percent = on;
     Q_EMIT displayAsPercentChanged();
+    Q_EMIT changed();
 }
 
 QString RkFloatProperty::widgetClassName() const

@@ -81,6 +81,7 @@ void RkIntProperty::setMinMax(int min, int max)
     m_min = min;
     m_max = max;
     Q_EMIT minMaxChanged();
+    Q_EMIT changed();
 }
 
 QString RkIntProperty::widgetClassName() const

@@ -18,4 +18,5 @@ void RkNumericProperty::setClamped(bool clamped)
         return;
     m_clamped = clamped;
     Q_EMIT clampedChanged(clamped);
+    Q_EMIT changed();
 }

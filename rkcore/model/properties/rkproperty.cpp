@@ -38,6 +38,7 @@ void RkProperty::setLabel(const QString& label)
         return;
     d->label = label;
     Q_EMIT labelChanged(label);
+    Q_EMIT changed();
 }
 
 QString RkProperty::getPath() const
@@ -61,6 +62,7 @@ void RkProperty::setHidden(bool hidden)
         return;
     d->hidden = hidden;
     Q_EMIT flagsChanged();
+    Q_EMIT changed();
 }
 
 bool RkProperty::isFavorite() const
@@ -74,6 +76,7 @@ void RkProperty::setIsFavorite(bool on)
         return;
     d->favorite = on;
     Q_EMIT flagsChanged();
+    Q_EMIT changed();
 }
 
 bool RkProperty::isGlobalFavorite() const
@@ -87,6 +90,7 @@ void RkProperty::setIsGlobalFavorite(bool on)
         return;
     d->globalFavorite = on;
     Q_EMIT flagsChanged();
+    Q_EMIT changed();
 }
 
 bool RkProperty::isSelected() const
@@ -113,6 +117,7 @@ void RkProperty::setLocked(bool on)
         return;
     d->locked = on;
     Q_EMIT flagsChanged();
+    Q_EMIT changed();
 }
 
 QString RkProperty::widgetClassName() const
@@ -178,6 +183,7 @@ void RkProperty::valueChanged(const QVariant& oldValue)
         rkUndoStack->push(
             std::make_unique<RkPropertyChangeCommand>(this, oldValue, getValueVariant()));
     Q_EMIT currentValueChanged();
+    Q_EMIT changed();
 }
 
 void RkProperty::logRefusedValue(const QString& what)

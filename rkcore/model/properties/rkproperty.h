@@ -66,6 +66,9 @@ Q_SIGNALS:
     void labelChanged(const QString& label);
     void flagsChanged();
     void selectedChanged(bool on);
+    // After each of the signals above but selectedChanged(), and after the subclasses' signals of
+    // their definition: one connection for whoever shows the whole property.
+    void changed();
 
 protected:
     // Call after the value changed: records the change in the open undo hold, if any, and emits

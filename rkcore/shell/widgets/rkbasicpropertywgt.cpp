@@ -44,6 +44,15 @@ void RkBasicPropertyWgt::setSelected(bool selected)
         d->slider->setSelected(selected);
 }
 
+void RkBasicPropertyWgt::removeAllProperties()
+{
+    if (d->slider)
+        d->slider->finishEditing();
+    if (d->hold)
+        finishPropertyEdit();
+    RkPropertyWgt::removeAllProperties();
+}
+
 bool RkBasicPropertyWgt::doOptionsDialog()
 {
     return false;

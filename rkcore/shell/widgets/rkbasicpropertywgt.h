@@ -16,6 +16,8 @@ public:
     ~RkBasicPropertyWgt() override;
 
     void setSelected(bool selected) override;
+    // A gesture in progress ends first, keeping what it did, as when the widget is hidden.
+    void removeAllProperties() override;
 
     // Lets the user edit the options of the properties. False when the widget has no options or
     // the user changed nothing.

@@ -29,6 +29,8 @@ void RkBoolPropertyWgt::addProperty(RkProperty* property)
 
 void RkBoolPropertyWgt::setSelected(bool selected)
 {
+    if (selected == isSelected())
+        return;
     RkBasicPropertyWgt::setSelected(selected);
     // The box's text stays readable on the highlight; unselected it inherits again.
     QPalette palette;

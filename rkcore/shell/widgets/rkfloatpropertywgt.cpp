@@ -136,16 +136,9 @@ RkFloatPropertyWgt::~RkFloatPropertyWgt() = default;
 
 void RkFloatPropertyWgt::addProperty(RkProperty* property)
 {
-    auto* floatProperty = qobject_cast<RkFloatProperty*>(property);
-    if (!floatProperty || getProperties().contains(property))
-        return;
-    connect(floatProperty, &RkNumericProperty::clampedChanged, this,
-            &RkFloatPropertyWgt::propertyChanged);
-    connect(floatProperty, &RkNumericProperty::minMaxChanged, this,
-            &RkFloatPropertyWgt::propertyChanged);
-    connect(floatProperty, &RkFloatProperty::displayAsPercentChanged, this,
-            &RkFloatPropertyWgt::propertyChanged);
-    RkBasicPropertyWgt::addProperty(property);
+    // Limits, clamping and percent display reach the widget through RkProperty::changed().
+    if (qobject_cast<RkFloatProperty*>(property))
+        RkBasicPropertyWgt::addProperty(property);
 }
 
 void RkFloatPropertyWgt::setIsMouseOverSlider(bool on)

@@ -22,14 +22,9 @@ RkIntPropertyWgt::~RkIntPropertyWgt() = default;
 
 void RkIntPropertyWgt::addProperty(RkProperty* property)
 {
-    auto* intProperty = qobject_cast<RkIntProperty*>(property);
-    if (!intProperty || getProperties().contains(property))
-        return;
-    connect(intProperty, &RkNumericProperty::clampedChanged, this,
-            &RkIntPropertyWgt::propertyChanged);
-    connect(intProperty, &RkNumericProperty::minMaxChanged, this,
-            &RkIntPropertyWgt::propertyChanged);
-    RkBasicPropertyWgt::addProperty(property);
+    // Limits and clamping reach the widget through RkProperty::changed().
+    if (qobject_cast<RkIntProperty*>(property))
+        RkBasicPropertyWgt::addProperty(property);
 }
 
 void RkIntPropertyWgt::setIsMouseOverSlider(bool on)

@@ -21,10 +21,9 @@ void RkPropertyWgt::addProperty(RkProperty* property)
     if (!property || d->properties.contains(property))
         return;
     d->properties.append(property);
+    // Two connections per property: a pooled widget is given other properties all the time.
     connect(property, &QObject::destroyed, this, &RkPropertyWgt::dropDestroyedProperties);
-    connect(property, &RkProperty::currentValueChanged, this, &RkPropertyWgt::propertyChanged);
-    connect(property, &RkProperty::labelChanged, this, &RkPropertyWgt::propertyChanged);
-    connect(property, &RkProperty::flagsChanged, this, &RkPropertyWgt::propertyChanged);
+    connect(property, &RkProperty::changed, this, &RkPropertyWgt::propertyChanged);
     updateFromProperties();
 }
 

@@ -514,14 +514,19 @@ void RkSlider::focusOutEvent(QFocusEvent* event)
     QWidget::focusOutEvent(event);
 }
 
-void RkSlider::hideEvent(QHideEvent* event)
+void RkSlider::finishEditing()
 {
-    // A gesture never outlives the slider's visibility: what was done so far is kept.
     if (d->gesture == TextEdit)
         closeEditor(true);
     else if (d->gesture == Dragging || d->gesture == KeySteps)
         finishGesture();
     d->gesture = NoGesture;
+}
+
+void RkSlider::hideEvent(QHideEvent* event)
+{
+    // A gesture never outlives the slider's visibility.
+    finishEditing();
     QWidget::hideEvent(event);
 }
 

@@ -55,6 +55,8 @@ public:
 
     // True between editStart() and the end or cancel of the gesture.
     bool isEditing() const;
+    // Ends a gesture in progress as hiding the slider does: what was done so far is kept.
+    void finishEditing();
     // The value as the slider shows it.
     QString getValueText() const;
 

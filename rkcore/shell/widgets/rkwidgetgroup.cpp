@@ -17,6 +17,12 @@ namespace
 // Row height of the host style (a custom metric); other styles give 0 and the font decides.
 constexpr int rowHeightMetric = 10;
 
+bool listed(const QList<QPointer<QWidget>>& widgets, const QWidget* widget)
+{
+    return std::any_of(widgets.cbegin(), widgets.cend(),
+                       [widget](const QPointer<QWidget>& listed) { return listed == widget; });
+}
+
 int spacingUnit(const QWidget* widget)
 {
     const int m = widget->style()->pixelMetric(QStyle::PM_CustomBase);
@@ -132,6 +138,10 @@ struct RkWidgetGroup::Private {
     QList<RkWidgetGroup*> groups;
     // Widgets belong to whoever added them; one that left the body no longer counts.
     QList<QPointer<QWidget>> widgets;
+    // Widgets that release() left in place for the next fill; settle() hides those not taken back.
+    QList<QPointer<QWidget>> stale;
+    // Deactivated by release() and still shown until settle().
+    bool released = false;
 };
 
 RkWidgetGroup::RkWidgetGroup(RkWidgetListLayout* layout, const QString& text, const QString& name,
@@ -143,8 +153,10 @@ RkWidgetGroup::RkWidgetGroup(RkWidgetListLayout* layout, const QString& text, co
     build(text, depth);
     if (layout)
         layout->addWidget(this);
-    if (parentWidget())
+    if (parentWidget()) {
+        aboutToShow();
         show();
+    }
 }
 
 RkWidgetGroup::RkWidgetGroup(RkWidgetGroup* parentGroup, const QString& text)
@@ -155,7 +167,14 @@ RkWidgetGroup::RkWidgetGroup(RkWidgetGroup* parentGroup, const QString& text)
     d->parentGroup = parentGroup;
     build(text, parentGroup->d->depth + 1);
     setContentsMargins(2 * spacingUnit(this), 0, 0, 0);
+    aboutToShow();
     show();
+}
+
+void RkWidgetGroup::aboutToShow()
+{
+    if (d->listLayout)
+        d->listLayout->aboutToShow();
 }
 
 RkWidgetGroup::~RkWidgetGroup() = default;
@@ -211,6 +230,8 @@ void RkWidgetGroup::setCollapsed(bool collapsed)
     if (d->collapsed == collapsed)
         return;
     d->collapsed = collapsed;
+    if (!collapsed)
+        aboutToShow();
     d->body->setVisible(!collapsed);
     if (!collapsed) {
         for (RkWidgetGroup* group : qAsConst(d->groups)) {
@@ -231,6 +252,9 @@ bool RkWidgetGroup::isActive() const
 void RkWidgetGroup::setActive(bool active)
 {
     d->active = active;
+    d->released = false;
+    if (active && isHidden())
+        aboutToShow();
     setVisible(active);
     if (d->parentGroup)
         d->parentGroup->relayout();
@@ -274,8 +298,12 @@ RkWidgetGroup* RkWidgetGroup::getGroup(const QString& path, bool create)
 // it showed before, so the reset emits nothing.
 void RkWidgetGroup::makeFresh(const QString& text)
 {
-    removeAllChildren();
+    // A released group is empty already; what it showed waits for settle() or a new owner.
+    if (!d->released)
+        removeAllChildren();
     d->collapsed = false;
+    if (d->body->isHidden())
+        aboutToShow();
     d->body->show();
     setText(text);
     setActive(true);
@@ -299,6 +327,11 @@ bool RkWidgetGroup::hasChildren() const
                        [](const RkWidgetGroup* group) { return group->d->active; });
 }
 
+bool RkWidgetGroup::holdsWidget(const QWidget* widget) const
+{
+    return widget && widget->parentWidget() == d->body && listed(d->widgets, widget);
+}
+
 QList<QWidget*> RkWidgetGroup::liveWidgets() const
 {
     QList<QWidget*> live;
@@ -309,18 +342,65 @@ QList<QWidget*> RkWidgetGroup::liveWidgets() const
     return live;
 }
 
+void RkWidgetGroup::pruneWidgets()
+{
+    QWidget* body = d->body;
+    d->widgets.erase(std::remove_if(d->widgets.begin(), d->widgets.end(),
+                                    [body](const QPointer<QWidget>& widget) {
+                                        return !widget || widget->parentWidget() != body;
+                                    }),
+                     d->widgets.end());
+}
+
 void RkWidgetGroup::addWidget(QWidget* widget)
 {
     if (!widget)
         return;
-    const QList<QWidget*> live = liveWidgets();
-    if (!live.contains(widget)) {
-        d->widgets.clear();
-        for (QWidget* kept : live)
-            d->widgets.append(kept);
-        d->widgets.append(widget);
-        d->bodyLayout->addWidget(widget);
+    const bool inBody = widget->parentWidget() == d->body;
+    if (inBody && listed(d->widgets, widget)) {
+        if (widget->isHidden())
+            aboutToShow();
+        widget->show();
+        relayout();
+        return;
     }
+    if (!inBody)
+        pruneWidgets(); // it may have been here before
+    else if (!d->stale.isEmpty())
+        d->stale.removeOne(widget);
+    // Sub-groups come first in the body's layout, then the widgets in order.
+    int previous = d->groups.size() - 1;
+    while (!d->widgets.isEmpty()) {
+        QWidget* last = d->widgets.last();
+        const int index =
+            last && last->parentWidget() == d->body ? d->bodyLayout->indexOf(last) : -1;
+        if (index >= 0) {
+            previous = std::max(previous, index);
+            break;
+        }
+        d->widgets.removeLast(); // gone, or no longer in the layout
+    }
+    int at = -1;
+    if (inBody) {
+        QLayoutItem* next = d->bodyLayout->itemAt(previous + 1);
+        at = next && next->widget() == widget ? previous + 1 : d->bodyLayout->indexOf(widget);
+    }
+    d->widgets.append(widget);
+    // A released widget taken back in its place stays there; released widgets skipped in between
+    // are hidden by settle().
+    if (at > previous) {
+        if (widget->isHidden()) {
+            aboutToShow();
+            widget->show();
+            relayout();
+        }
+        return;
+    }
+    if (at >= 0)
+        d->bodyLayout->removeWidget(widget);
+    d->bodyLayout->addWidget(widget);
+    if (widget->isHidden())
+        aboutToShow();
     widget->show();
     relayout();
 }
@@ -328,8 +408,13 @@ void RkWidgetGroup::addWidget(QWidget* widget)
 void RkWidgetGroup::removeAllChildren()
 {
     QWidget* home = d->listLayout ? d->listLayout->parentWidget() : nullptr;
-    const QList<QWidget*> live = liveWidgets();
+    QList<QWidget*> live = liveWidgets();
+    for (const QPointer<QWidget>& widget : qAsConst(d->stale)) {
+        if (widget && widget->parentWidget() == d->body && !live.contains(widget))
+            live.append(widget);
+    }
     d->widgets.clear();
+    d->stale.clear();
     for (QWidget* widget : live) {
         d->bodyLayout->removeWidget(widget);
         widget->hide();
@@ -363,6 +448,41 @@ void RkWidgetGroup::relayout()
         group->d->body->updateGeometry();
         group->updateGeometry();
     }
+}
+
+void RkWidgetGroup::release()
+{
+    for (const QPointer<QWidget>& widget : qAsConst(d->widgets)) {
+        if (widget && widget->parentWidget() == d->body)
+            d->stale.append(widget);
+    }
+    d->widgets.clear();
+    for (RkWidgetGroup* group : qAsConst(d->groups))
+        group->release();
+    d->active = false;
+    d->released = true;
+}
+
+void RkWidgetGroup::settle()
+{
+    bool changed = false;
+    for (const QPointer<QWidget>& widget : qAsConst(d->stale)) {
+        if (widget && widget->parentWidget() == d->body && !listed(d->widgets, widget)) {
+            d->bodyLayout->removeWidget(widget);
+            widget->hide();
+            changed = true;
+        }
+    }
+    d->stale.clear();
+    for (RkWidgetGroup* group : qAsConst(d->groups))
+        group->settle();
+    if (d->released) {
+        d->released = false;
+        hide();
+        changed = true;
+    }
+    if (changed)
+        relayout();
 }
 
 bool RkWidgetGroup::moveWidgetListGroupToEnd(RkWidgetGroup* group)

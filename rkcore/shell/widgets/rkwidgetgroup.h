@@ -47,6 +47,8 @@ public:
     RkWidgetGroup* getGroup(int index) const;
     // True when the group holds a widget or an active sub-group.
     bool hasChildren() const;
+    // True when the widget is one of the group's own widgets.
+    bool holdsWidget(const QWidget* widget) const;
 
     // Appends a widget below the group's sub-groups and shows it (also when it was hidden
     // before). The body becomes the widget's parent; a widget that is reparented elsewhere or
@@ -59,6 +61,15 @@ public:
     // Hides inactive sub-groups and has the enclosing layouts recompute their sizes; call it after
     // a batch of changes. Works through the sub-groups too.
     void resetLayout();
+
+    // For a list that is emptied and filled again at once: like removeAllChildren() followed by
+    // setActive(false), but the widgets and sub-groups stay where they are, shown, until
+    // settle(). A widget added back in its old place, or a sub-group taken again, is neither
+    // moved nor hidden and shown again.
+    void release();
+    // Hides what release() left and nothing took back: widgets (they stay children of the group,
+    // out of its layout) and inactive groups, this one included. Works through the sub-groups.
+    void settle();
 
     // Moves a group found anywhere below this one to the end of its parent's sub-groups. False if
     // the group is not below this one.
@@ -83,7 +94,9 @@ private:
     void build(const QString& text, int depth);
     void makeFresh(const QString& text);
     void relayout();
+    void aboutToShow();
     QList<QWidget*> liveWidgets() const;
+    void pruneWidgets();
 
     struct Private;
     std::unique_ptr<Private> d;

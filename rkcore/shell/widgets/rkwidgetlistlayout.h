@@ -13,4 +13,19 @@ class RKCORE_EXPORT RkWidgetListLayout : public QBoxLayout
 public:
     explicit RkWidgetListLayout(QWidget* parent = nullptr);
     ~RkWidgetListLayout() override;
+
+    // A list emptied and filled again (RkWidgetGroup::release() and settle()) stays shown from
+    // beginRefill() to endRefill() while its groups take their widgets back in place. The first
+    // group or widget that has to be shown hides the layout's widget until endRefill(): each
+    // widget shown in a shown list has every layout around it recomputed at once, which a long
+    // fill cannot afford, while showing the list once at the end lays it out once.
+    void beginRefill();
+    void endRefill();
+    bool isRefilling() const;
+    // The groups call this before they show something.
+    void aboutToShow();
+
+private:
+    bool m_refilling = false;
+    bool m_hidden = false;
 };

@@ -27,19 +27,6 @@
 namespace
 {
 
-// Counts the rebuilds of a list: each one hides it first.
-class RebuildCounter : public QObject
-{
-public:
-    int count = 0;
-    bool eventFilter(QObject*, QEvent* event) override
-    {
-        if (event->type() == QEvent::Hide)
-            ++count;
-        return false;
-    }
-};
-
 // The list's widget of the property, scrolled into view; pooled widgets not in use are hidden.
 RkPropertyWgt* widgetOf(RkPropertyPaneList* list, RkProperty* property)
 {
@@ -178,8 +165,7 @@ QStringList TestRkPropertiesPane::rightClickMenu(RkPropertyWgt* widget)
 
 void TestRkPropertiesPane::followsSelectionWithOneRebuild()
 {
-    RebuildCounter rebuilds;
-    pane()->getPropertiesList()->installEventFilter(&rebuilds);
+    QSignalSpy rebuilds(pane(), &RkPropertiesPane::listsRebuilt);
     QCOMPARE(caption(), QStringLiteral("<None>"));
     QVERIFY(!pane()->findChild<QWidget*>(QStringLiteral("FavoritesDivider"))->isVisible());
     QVERIFY(!pane()->getFavoritesList()->isVisible());
@@ -188,9 +174,9 @@ void TestRkPropertiesPane::followsSelectionWithOneRebuild()
     rkScene->selectNode(m_figure);
     rkScene->selectNode(prop);
     rkScene->selectNode(m_bone);
-    QCOMPARE(rebuilds.count, 0);
+    QCOMPARE(rebuilds.count(), 0);
     QCoreApplication::processEvents();
-    QCOMPARE(rebuilds.count, 1);
+    QCOMPARE(rebuilds.count(), 1);
     QCOMPARE(caption(), QStringLiteral("Demo Figure : ") + m_bone->getLabel());
     // Neither text is cut by the other, whatever the font.
     const QLabel* captionLabel = pane()->findChildren<QLabel*>().at(0);
@@ -215,8 +201,7 @@ void TestRkPropertiesPane::loadRebuildsOnceAtTheEnd()
     QTemporaryDir dir;
     const QString file = dir.filePath(QStringLiteral("scene.rks"));
     QVERIFY(rkScene->save(file));
-    RebuildCounter rebuilds;
-    pane()->getPropertiesList()->installEventFilter(&rebuilds);
+    QSignalSpy rebuilds(pane(), &RkPropertiesPane::listsRebuilt);
 
     // The loaded nodes get selected and the event loop runs while the load is still going.
     QMetaObject::Connection midLoad = connect(rkScene, &RkScene::nodeAdded, this, [](RkNode* node) {
@@ -226,9 +211,9 @@ void TestRkPropertiesPane::loadRebuildsOnceAtTheEnd()
     });
     QVERIFY(rkScene->load(file));
     disconnect(midLoad);
-    QCOMPARE(rebuilds.count, 0);
+    QCOMPARE(rebuilds.count(), 0);
     QCoreApplication::processEvents();
-    QCOMPARE(rebuilds.count, 1);
+    QCOMPARE(rebuilds.count(), 1);
     QCOMPARE(caption(), QStringLiteral("Ball"));
 }
 

@@ -1,4 +1,5 @@
 #include "demo/rkdemoscene.h"
+#include "properties/rkboolproperty.h"
 #include "properties/rkfloatproperty.h"
 #include "properties/rkpropertygroup.h"
 #include "properties/rkpropertygrouptree.h"
@@ -11,11 +12,14 @@
 #include "undo/rkundostack.h"
 #include "widgets/rkfloatpropertywgt.h"
 #include "widgets/rkfloatslider.h"
+#include "widgets/rkslider.h"
 #include "widgets/rkwidgetgroup.h"
 
+#include <QCheckBox>
 #include <QLabel>
 #include <QScrollBar>
 
+#include <algorithm>
 #include <memory>
 
 namespace
@@ -88,6 +92,36 @@ QList<RkPropertyWgt*> widgetsIn(RkWidgetGroup* group)
     return widgets;
 }
 
+// What a user sees of a list, top to bottom: group headers (folded or not) and each property
+// widget's label and value, with their heights in the list.
+QStringList seen(RkPropertyPaneList* list)
+{
+    QStringList lines;
+    for (QWidget* widget : list->widget()->findChildren<QWidget*>()) {
+        if (!widget->isVisibleTo(list))
+            continue;
+        QString text;
+        if (auto* group = qobject_cast<RkWidgetGroup*>(widget)) {
+            text = QStringLiteral("[%1]%2").arg(group->text(),
+                                                group->isCollapsed() ? QStringLiteral(" +") : "");
+        } else if (auto* slider = qobject_cast<RkSlider*>(widget)) {
+            text = slider->getLabel() + QStringLiteral(" = ") + slider->getValueText();
+        } else if (auto* box = qobject_cast<QCheckBox*>(widget)) {
+            text = box->text() + QStringLiteral(" = %1").arg(int(box->checkState()));
+        } else {
+            continue;
+        }
+        const QPoint at = widget->mapTo(list->widget(), QPoint());
+        lines.append(QStringLiteral("%1 %2 %3 %4")
+                         .arg(at.y(), 5, 10, QLatin1Char('0'))
+                         .arg(at.x(), 3, 10, QLatin1Char('0'))
+                         .arg(widget->height())
+                         .arg(text));
+    }
+    lines.sort();
+    return lines;
+}
+
 void clickHeader(RkWidgetGroup* group)
 {
     QWidget* header = group->childAt(QPoint(40, 4));
@@ -112,6 +146,9 @@ private Q_SLOTS:
     void viewStateComesBack();
     void viewStateOfForgottenAndNewNodes();
     void reusedGroupFoldsOnlyItsOwnPropertyGroup();
+    void rebuiltListLooksLikeANewOne_data();
+    void rebuiltListLooksLikeANewOne();
+    void clearedListShowsNothingOnceTheEventLoopRuns();
 
 private:
     std::unique_ptr<QWidget> window;
@@ -170,17 +207,23 @@ void TestRkPropertyPaneList::mergesEqualPropertiesAndReusesWidgets()
     QCOMPARE(xb->getValue(), xa->getValue());
     QCOMPARE(rkUndoStack->count(), 1);
 
-    // After A and then B have each been shown, switching between them makes no widget.
+    // After A and then B have each been shown, switching between them makes no widget of any
+    // kind (groups, property widgets, their sliders and boxes) and deletes none.
     rkScene->selectNode(a);
     rebuild(list);
     rkScene->selectNode(b);
     rebuild(list);
-    const int made = list->findChildren<RkPropertyWgt*>().size();
+    const auto allWidgets = [this] {
+        QList<QWidget*> widgets = list->findChildren<QWidget*>();
+        std::sort(widgets.begin(), widgets.end());
+        return widgets;
+    };
+    const QList<QWidget*> made = allWidgets();
     for (RkNode* node : {a, b, a, b}) {
         rkScene->selectNode(node);
         rebuild(list);
     }
-    QCOMPARE(list->findChildren<RkPropertyWgt*>().size(), made);
+    QCOMPARE(allWidgets(), made);
     QVERIFY(!list->getGroup(QStringLiteral("Only A"), false));
     QCOMPARE(widgetsIn(list->getGroup(QStringLiteral("Only B"), false)).size(), 20);
 }
@@ -397,6 +440,85 @@ void TestRkPropertyPaneList::reusedGroupFoldsOnlyItsOwnPropertyGroup()
     QVERIFY(!onlyA->getCollapsed());
     clickHeader(group);
     QVERIFY(!onlyB->getCollapsed());
+}
+
+void TestRkPropertyPaneList::rebuiltListLooksLikeANewOne_data()
+{
+    QTest::addColumn<QStringList>("selections"); // node names, "+" joins a multiple selection
+    QTest::newRow("A, then B") << QStringList{"A", "B"};
+    QTest::newRow("B, A, then B again") << QStringList{"B", "A", "B"};
+    QTest::newRow("A with B, then C") << QStringList{"A+B", "C"};
+    QTest::newRow("C, then A with B") << QStringList{"C", "A+B"};
+    QTest::newRow("A, C, then A again") << QStringList{"A", "C", "A"};
+    QTest::newRow("C, nothing, then B") << QStringList{"C", "", "B"};
+    QTest::newRow("X, then Y") << QStringList{"X", "Y"};
+    QTest::newRow("Y, then X") << QStringList{"Y", "X"};
+}
+
+// The pooled list, rebuilt again and again, shows exactly what a list built once for the last
+// selection shows: the same groups and widgets in the same places, with the same texts.
+void TestRkPropertyPaneList::rebuiltListLooksLikeANewOne()
+{
+    QFETCH(QStringList, selections);
+    // C differs in shape: fewer groups and widgets, of other kinds, one group folded.
+    RkNode* c = addNode(QStringLiteral("C"), QStringLiteral("Only C"), 3);
+    c->addProperty(new RkBoolProperty(QStringLiteral("on"), QStringLiteral("Visible")),
+                   QStringLiteral("Only C/Display"));
+    c->getPropertyGroups()->findChild(QStringLiteral("Transforms"))->setCollapsed(true);
+    // X and Y hold the same groups, filled unevenly: a group takes its widgets from the pool in
+    // another order than it showed them before.
+    for (const auto& shape :
+         {qMakePair(QStringLiteral("X"), 3), qMakePair(QStringLiteral("Y"), 1)}) {
+        RkNode* node = addNode(shape.first, QStringLiteral("One"), shape.second);
+        for (int i = 0; i < 5 - shape.second; ++i) {
+            node->addProperty(
+                new RkFloatProperty(QStringLiteral("t%1").arg(i),
+                                    QStringLiteral("%1 Two %2").arg(shape.first).arg(i)),
+                QStringLiteral("Two"));
+        }
+    }
+    for (RkProperty* property : b->getProperties()) {
+        if (auto* number = qobject_cast<RkFloatProperty*>(property))
+            number->setValue(number->getValue() + 0.5f);
+    }
+    const auto select = [](const QString& names) {
+        rkScene->clearSelection();
+        for (const QString& name : names.split(QLatin1Char('+'), Qt::SkipEmptyParts))
+            rkScene->selectNode(rkScene->findNode(name), true);
+    };
+    for (const QString& names : selections) {
+        select(names);
+        rebuild(list);
+    }
+    window->resize(600, 240);
+    auto* fresh = new RkPropertyPaneList(window.get(), QStringLiteral("Fresh"));
+    fresh->setShowFavorites(false);
+    fresh->setGeometry(300, 0, 300, 240);
+    fresh->show();
+    rebuild(fresh);
+    QVERIFY(!seen(fresh).isEmpty());
+    QTRY_COMPARE(seen(list), seen(fresh));
+    QCOMPARE(list->widget()->height(), fresh->widget()->height());
+    // Pooled widgets not in use are hidden, not merely out of sight.
+    int shown = 0;
+    for (RkPropertyWgt* widget : list->findChildren<RkPropertyWgt*>())
+        shown += widget->isHidden() ? 0 : 1;
+    QCOMPARE(shown, fresh->findChildren<RkPropertyWgt*>().size());
+}
+
+// Emptied and never filled (the favourites list has nothing to show without a selection): what
+// the list showed goes once the event loop runs.
+void TestRkPropertyPaneList::clearedListShowsNothingOnceTheEventLoopRuns()
+{
+    rkScene->selectNode(a);
+    rebuild(list);
+    QVERIFY(!seen(list).isEmpty());
+    list->clear();
+    QCoreApplication::processEvents();
+    QCOMPARE(seen(list), QStringList());
+    for (RkPropertyWgt* widget : list->findChildren<RkPropertyWgt*>())
+        QVERIFY(widget->isHidden() || !widget->isVisibleTo(list));
+    QVERIFY(list->widget()->minimumHeight() < 10);
 }
 
 RK_TEST_MAIN(TestRkPropertyPaneList)

@@ -7,6 +7,7 @@
 
 #include <QSignalSpy>
 
+#include <functional>
 #include <limits>
 
 class TestRkProperty : public QObject
@@ -19,6 +20,7 @@ private Q_SLOTS:
     void flagsSetEachFlag();
     void lockRefusesTheSettersOnly();
     void memorizedValueFollowsTheDefaultUntilSet();
+    void everyShownChangeSaysChanged();
 };
 
 void TestRkProperty::nonNumbersNeverEnterAProperty()
@@ -143,6 +145,39 @@ void TestRkProperty::memorizedValueFollowsTheDefaultUntilSet()
     QCOMPARE(label.getLabel(), QStringLiteral("note"));
     QVERIFY(label.isHidden() && !label.isClamped());
     QCOMPARE(label.getValue(), 4);
+}
+
+// Widgets follow a property through changed() alone.
+void TestRkProperty::everyShownChangeSaysChanged()
+{
+    RkFloatProperty f(QStringLiteral("f"), QStringLiteral("F"));
+    RkIntProperty i(QStringLiteral("i"), QStringLiteral("I"));
+    QSignalSpy floatChanged(&f, &RkProperty::changed);
+    QSignalSpy intChanged(&i, &RkProperty::changed);
+    int expected = 0;
+    const auto step = [&](const std::function<void()>& change, bool says) {
+        change();
+        expected += says ? 1 : 0;
+        QCOMPARE(floatChanged.count(), expected);
+    };
+    step([&] { f.setValue(0.5f); }, true);
+    step([&] { f.setValue(0.5f); }, false);
+    step([&] { f.setValueVariant(QVariant(0.25)); }, true);
+    step([&] { f.setLabel(QStringLiteral("Bend")); }, true);
+    step([&] { f.setMinMax(-1, 2); }, true);
+    step([&] { f.setClamped(true); }, true);
+    step([&] { f.setDisplayAsPercent(true); }, true);
+    step([&] { f.setHidden(true); }, true);
+    step([&] { f.setIsFavorite(true); }, true);
+    step([&] { f.setIsGlobalFavorite(true); }, true);
+    step([&] { f.setLocked(true); }, true);
+    step([&] { f.setSelected(true); }, false);
+    step([&] { f.setPath(QStringLiteral("Morphs")); }, false);
+
+    i.setMinMax(0, 9);
+    i.setClamped(true);
+    i.setValue(4);
+    QCOMPARE(intChanged.count(), 3);
 }
 
 RK_TEST_MAIN(TestRkProperty)

@@ -89,6 +89,8 @@ private Q_SLOTS:
     void gestureSetsAllPropertiesInOneEntry();
     void escLeavesNoEntryAndNoChange();
     void destroyedPropertyDropsOut();
+    void followsOnlyThePropertiesItHolds();
+    void emptiedMidGestureKeepsWhatWasDone();
     void rightPressReachesTheParent();
     void selectionAndMouseOverBar();
     void boolWidgetTogglesAll();
@@ -200,6 +202,80 @@ void TestRkPropertyWgt::destroyedPropertyDropsOut()
     QVERIFY(!slider->isEnabled());
     drag(slider, slider->calcSliderRect().center(), 20);
     QCOMPARE(rkUndoStack->count(), 1);
+}
+
+// Changes made elsewhere (undo, scripts, other widgets) show at once; a widget given other
+// properties, as a pool does, no longer hears from the ones it had.
+void TestRkPropertyWgt::followsOnlyThePropertiesItHolds()
+{
+    RkFloatProperty* bend = props[0];
+    bend->setLabel(QStringLiteral("Bend Left"));
+    QCOMPARE(slider->getLabel(), QStringLiteral("Bend Left"));
+    bend->setMinMax(-2, 3);
+    QCOMPARE(slider->getMin(), -2.0f);
+    QCOMPARE(slider->getMax(), 3.0f);
+    bend->setClamped(true);
+    QVERIFY(slider->isClamped());
+    bend->setDisplayAsPercent(true);
+    QCOMPARE(slider->getValueText(), QStringLiteral("10.0%"));
+    bend->setValue(0.5f);
+    QVERIFY(slider->isMixed());
+    QCOMPARE(slider->getValueText(), QStringLiteral("50.0%"));
+    props[2]->setLocked(true);
+    QVERIFY(!slider->isEnabled());
+
+    widget->removeAllProperties();
+    RkFloatProperty other(QStringLiteral("twist"), QStringLiteral("Twist"));
+    other.setValue(0.75f);
+    widget->addProperty(&other);
+    QCOMPARE(slider->getLabel(), QStringLiteral("Twist"));
+    QCOMPARE(slider->getValueText(), QStringLiteral("0.750"));
+    QVERIFY(!slider->isMixed());
+    QVERIFY(slider->isEnabled());
+    for (RkFloatProperty* p : qAsConst(props)) {
+        p->setLabel(QStringLiteral("Old"));
+        p->setValue(0.9f);
+        p->setDisplayAsPercent(false);
+        p->setLocked(false);
+    }
+    QCOMPARE(slider->getLabel(), QStringLiteral("Twist"));
+    QCOMPARE(slider->getValueText(), QStringLiteral("0.750"));
+    other.setMinMax(0, 0.5f);
+    QCOMPARE(slider->getMax(), 0.5f);
+    widget->removeAllProperties();
+}
+
+// A pool empties a widget and gives it other properties while the user may still be at it: the
+// gesture ends there, as if the widget had been hidden, and goes no further.
+void TestRkPropertyWgt::emptiedMidGestureKeepsWhatWasDone()
+{
+    RkFloatProperty other(QStringLiteral("twist"), QStringLiteral("Twist"));
+    other.setValue(0.5f);
+    const QPoint from = slider->calcSliderRect().center();
+    drag(slider, from, 20, false);
+    widget->removeAllProperties();
+    widget->addProperty(&other);
+    moveHeld(slider, from + QPoint(60, 0));
+    QTest::mouseRelease(slider, Qt::LeftButton, {}, from + QPoint(60, 0));
+    for (RkFloatProperty* p : qAsConst(props)) {
+        QCOMPARE(p->getValue(), 0.3f);
+        QVERIFY(!p->isEditing());
+    }
+    QCOMPARE(other.getValue(), 0.5f);
+    QCOMPARE(rkUndoStack->count(), 1);
+    QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Bend"));
+
+    // Typed but not yet entered: the text counts, for the property it was typed for.
+    QTest::mouseClick(slider, Qt::LeftButton, {}, slider->calcTextRect().center());
+    auto* editor = slider->findChild<QLineEdit*>();
+    QVERIFY(editor && editor->isVisible());
+    QTest::keyClicks(editor, QStringLiteral("0.25"));
+    widget->removeAllProperties();
+    QVERIFY(!editor->isVisible());
+    QCOMPARE(other.getValue(), 0.25f);
+    QCOMPARE(rkUndoStack->count(), 2);
+    QCOMPARE(rkUndoStack->getUndoCaption(), QStringLiteral("Twist"));
+    QCOMPARE(props[0]->getValue(), 0.3f);
 }
 
 void TestRkPropertyWgt::rightPressReachesTheParent()

@@ -9,6 +9,8 @@
 #include <QPointer>
 #include <QScrollArea>
 
+#include <algorithm>
+
 namespace
 {
 
@@ -47,6 +49,34 @@ QList<QWidget*> widgetsOf(const RkWidgetGroup* group)
     return widgets;
 }
 
+// Counts the show and hide events a widget gets.
+class VisibilityEvents : public QObject
+{
+public:
+    int count = 0;
+    void watch(QWidget* widget) { widget->installEventFilter(this); }
+    bool eventFilter(QObject*, QEvent* event) override
+    {
+        if (event->type() == QEvent::Show || event->type() == QEvent::Hide)
+            ++count;
+        return false;
+    }
+};
+
+// The widgets a user sees in the group, top to bottom.
+QList<QWidget*> shownInOrder(const RkWidgetGroup* group)
+{
+    QList<QWidget*> shown;
+    for (QWidget* widget : widgetsOf(group)) {
+        if (widget->isVisible())
+            shown.append(widget);
+    }
+    std::sort(shown.begin(), shown.end(), [group](const QWidget* a, const QWidget* b) {
+        return a->mapTo(group, QPoint()).y() < b->mapTo(group, QPoint()).y();
+    });
+    return shown;
+}
+
 QStringList subGroupTexts(const RkWidgetGroup* group)
 {
     QStringList texts;
@@ -68,6 +98,8 @@ private Q_SLOTS:
     void collapsingHidesAndShowsTheSameWidgets();
     void removeAllChildrenEmptiesTheGroup();
     void movingAGroupToTheEnd();
+    void refillKeepsWhatComesBackInPlace();
+    void refillWithNewWidgetsShowsTheListOnce();
 };
 
 void TestRkWidgetGroup::pathsFindCreateAndReuse()
@@ -222,6 +254,101 @@ void TestRkWidgetGroup::movingAGroupToTheEnd()
     RkWidgetGroup* stranger = list.addGroup(QStringLiteral("Stranger"));
     QVERIFY(!top->moveWidgetListGroupToEnd(stranger));
     QCOMPARE(subGroupTexts(top), QStringList({"B", "C", "A"}));
+}
+
+void TestRkWidgetGroup::refillKeepsWhatComesBackInPlace()
+{
+    List list;
+    RkWidgetGroup* group = list.addGroup(QStringLiteral("Light"));
+    QList<QLabel*> labels;
+    for (const char* text : {"Intensity", "Colour", "Range"}) {
+        labels.append(new QLabel(QString::fromLatin1(text)));
+        group->addWidget(labels.last());
+    }
+    RkWidgetGroup* shadow = group->getGroup(QStringLiteral("Shadow"), true);
+    auto* softness = new QLabel(QStringLiteral("Softness"));
+    shadow->addWidget(softness);
+    RkWidgetGroup* other = list.addGroup(QStringLiteral("Other"));
+    auto* note = new QLabel(QStringLiteral("Note"));
+    other->addWidget(note);
+    QVERIFY(list.show());
+    VisibilityEvents events;
+    for (QWidget* widget : {static_cast<QWidget*>(group), static_cast<QWidget*>(shadow),
+                            static_cast<QWidget*>(list.content), static_cast<QWidget*>(softness),
+                            static_cast<QWidget*>(labels[0]), static_cast<QWidget*>(labels[2])})
+        events.watch(widget);
+
+    // The same content again, less one widget and one group: nothing is hidden or shown but what
+    // is left out, and the list is not hidden either.
+    list.layout->beginRefill();
+    group->release();
+    other->release();
+    QVERIFY(!group->isActive() && !group->hasChildren());
+    QCOMPARE(group->getGroup(QStringLiteral("Shadow"), false),
+             static_cast<RkWidgetGroup*>(nullptr));
+    group->setActive(true);
+    QCOMPARE(group->getGroup(QStringLiteral("Shadow"), true), shadow);
+    shadow->addWidget(softness);
+    group->addWidget(labels[0]);
+    group->addWidget(labels[2]);
+    group->settle();
+    other->settle();
+    list.layout->endRefill();
+    QCOMPARE(events.count, 0);
+    QCOMPARE(widgetsOf(group), QList<QWidget*>({labels[0], labels[2]}));
+    QVERIFY(labels[1]->isHidden());
+    QCOMPARE(labels[1]->parentWidget()->parentWidget(), group); // kept for its owner
+    QVERIFY(!other->isVisible() && !other->isActive());
+    QVERIFY(note->isHidden());
+    QTRY_COMPARE(shownInOrder(group), QList<QWidget*>({labels[0], labels[2]}));
+    // No gap where the left-out widget was (one pixel of spacing).
+    QTRY_COMPARE(labels[2]->y(), labels[0]->geometry().bottom() + 2);
+    QVERIFY(shadow->mapTo(group, QPoint()).y() < labels[0]->mapTo(group, QPoint()).y());
+
+    // In another order, and with the left-out widget back: what a user sees follows the new order.
+    list.layout->beginRefill();
+    group->release();
+    group->setActive(true);
+    for (QLabel* label : {labels[2], labels[1], labels[0]})
+        group->addWidget(label);
+    group->settle();
+    list.layout->endRefill();
+    QCOMPARE(widgetsOf(group), QList<QWidget*>({labels[2], labels[1], labels[0]}));
+    QVERIFY(!shadow->isVisible() && !softness->isVisible());
+    QTRY_COMPARE(shownInOrder(group), QList<QWidget*>({labels[2], labels[1], labels[0]}));
+
+    // Emptied for good, a released group hands everything back to the list's widget.
+    group->release();
+    group->removeAllChildren();
+    for (QLabel* label : labels)
+        QCOMPARE(label->parentWidget(), list.content);
+}
+
+void TestRkWidgetGroup::refillWithNewWidgetsShowsTheListOnce()
+{
+    List list;
+    RkWidgetGroup* group = list.addGroup(QStringLiteral("Morphs"));
+    QVERIFY(list.show());
+    VisibilityEvents events;
+    events.watch(list.content);
+    list.layout->beginRefill();
+    group->release();
+    group->setActive(true);
+    QList<QLabel*> labels;
+    for (int i = 0; i < 40; ++i) {
+        labels.append(new QLabel(QStringLiteral("Morph %1").arg(i)));
+        group->addWidget(labels.last());
+    }
+    group->getGroup(QStringLiteral("Face"), true)->addWidget(new QLabel(QStringLiteral("Smile")));
+    // Hidden at the first widget to show, shown at the end: two events, not one per widget.
+    QCOMPARE(events.count, 1);
+    QVERIFY(!list.content->isVisible());
+    group->settle();
+    list.layout->endRefill();
+    QCOMPARE(events.count, 2);
+    QVERIFY(list.content->isVisible());
+    QTRY_COMPARE(shownInOrder(group), QList<QWidget*>(labels.cbegin(), labels.cend()));
+    QVERIFY(list.content->minimumHeight() > 40 * labels[0]->height());
 }
 
 RK_TEST_MAIN(TestRkWidgetGroup)
