@@ -214,6 +214,8 @@ void TestRkEzPropertiesPane::init()
     rkScene->selectNode(m_figure);
     QTRY_COMPARE(wgt()->getFigure(), static_cast<RkNode*>(m_figure));
     QTRY_VERIFY(wgt()->getCategoryModel()->rowCount() > 0);
+    // The chooser lays its first level out on the view's own delayed layout.
+    QTRY_VERIFY(comboAt(0));
 }
 
 void TestRkEzPropertiesPane::cleanup()
@@ -238,8 +240,8 @@ QComboBox* TestRkEzPropertiesPane::comboAt(int level) const
 
 void TestRkEzPropertiesPane::choose(int level, const QString& text)
 {
-    QComboBox* combo = comboAt(level);
-    QVERIFY(combo);
+    QComboBox* combo = nullptr;
+    QTRY_VERIFY((combo = comboAt(level)) != nullptr);
     const int i = combo->findText(text);
     QVERIFY2(i >= 0, qPrintable(text));
     combo->setCurrentIndex(i);
@@ -545,10 +547,12 @@ void TestRkEzPropertiesPane::switchingCategoriesLeavesNoWidgets()
     combo->setCurrentIndex(display);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     const int widgets = m_pane->findChildren<QWidget*>().size();
+    // The posted work of each switch (deferred deletes, layouts, repaints) is done before the
+    // next, as the event loop would between two choices of the user.
     for (int i = 0; i < 1000; ++i) {
         combo->setCurrentIndex(i % 2 ? display : morphs);
-        if (i % 50 == 0)
-            QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+        QCoreApplication::sendPostedEvents();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     }
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     QCOMPARE(m_pane->findChildren<QWidget*>().size(), widgets);
