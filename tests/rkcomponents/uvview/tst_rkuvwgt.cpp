@@ -88,6 +88,23 @@ template <typename Test> bool near(const QImage& image, int x, int y, Test test)
     return false;
 }
 
+// A view whose picture can be read back as drawn: into the back buffer and read before any swap,
+// since after a swap the back buffer may hold an older frame.
+class ReadableUVWgt : public RkUVWgt
+{
+public:
+    using RkUVWgt::setAutoBufferSwap;
+};
+
+QImage drawnNow(ReadableUVWgt& wgt)
+{
+    wgt.setAutoBufferSwap(false);
+    wgt.updateGL();
+    const QImage image = wgt.grabFrameBuffer();
+    wgt.setAutoBufferSwap(true);
+    return image;
+}
+
 } // namespace
 
 class TestRkUVWgt : public QObject
@@ -211,11 +228,11 @@ void TestRkUVWgt::bounds()
     QVERIFY(qAbs(tall.bottom + 0.6111) < 1e-4 && qAbs(tall.top - 1.6111) < 1e-4);
 
     // On screen: the wide widget's unit square starts 0.6111 / 2.2222 of the width in.
-    RkUVWgt wgt;
+    ReadableUVWgt wgt;
     wgt.resize(400, 200);
     wgt.show();
     QVERIFY(QTest::qWaitForWindowExposed(&wgt));
-    const QImage image = wgt.grabFrameBuffer();
+    const QImage image = drawnNow(wgt);
     QVERIFY(near(image, 110, 100, isBlack));
     QVERIFY(near(image, 290, 100, isBlack));
     QVERIFY(!near(image, 105, 100, isBlack));
@@ -227,12 +244,12 @@ void TestRkUVWgt::drawnImage()
     auto mesh = twoQuads();
     auto* set = new RkUVSet(mesh.get());
     set->setPolygonSelected(2, true); // the right quad
-    RkUVWgt wgt;
+    ReadableUVWgt wgt;
     wgt.resize(200, 200);
     wgt.setUV(set);
     wgt.show();
     QVERIFY(QTest::qWaitForWindowExposed(&wgt));
-    const QImage image = wgt.grabFrameBuffer();
+    const QImage image = drawnNow(wgt);
     QCOMPARE(image.size(), QSize(200, 200));
     // Unit square corners, black.
     for (const QPoint& p : {QPoint(10, 10), QPoint(190, 10), QPoint(10, 190), QPoint(190, 190)})
@@ -248,16 +265,15 @@ void TestRkUVWgt::drawnImage()
 
     // Hidden material 1: the middle edge stays black (the left quad), nothing red remains.
     set->setMaterialVisible(1, false);
-    wgt.updateGL();
-    const QImage hidden = wgt.grabFrameBuffer();
+    const QImage hidden = drawnNow(wgt);
     QVERIFY(near(hidden, 100, 100, isBlack));
     QVERIFY(!near(hidden, 100, 100, isRed));
 
     // Weld and unweld move nothing.
-    const QImage before = wgt.grabFrameBuffer();
+    const QImage before = drawnNow(wgt);
     wgt.doWeld();
     wgt.doUnweld();
-    QCOMPARE(wgt.grabFrameBuffer(), before);
+    QCOMPARE(drawnNow(wgt), before);
 }
 
 void TestRkUVWgt::fastPathDrawsTheSamePixels()
