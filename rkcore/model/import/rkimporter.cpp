@@ -18,8 +18,12 @@
 #include <QFileInfo>
 #include <QHash>
 #include <QImage>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
 #include <QMutex>
 #include <QSet>
+#include <QtEndian>
 
 #include <assimp/Importer.hpp>
 #include <assimp/ProgressHandler.hpp>
@@ -323,12 +327,23 @@ bool RkImporter::Private::convert(const aiScene* scene)
         }
     }
 
+    // Nodes by name, the first in hierarchy order winning as a search from the root would find.
+    QHash<QByteArray, const aiNode*> byName;
+    for (const aiNode* node : qAsConst(order)) {
+        const QByteArray name(node->mName.C_Str(), int(node->mName.length));
+        if (!byName.contains(name))
+            byName.insert(name, node);
+    }
+    auto findNode = [&byName](const aiString& name) {
+        return byName.value(QByteArray(name.C_Str(), int(name.length)));
+    };
+
     // Bones: every node a skin names, and the nodes between them and the root.
     QSet<const aiNode*> boneNodes;
     for (unsigned mi = 0; mi < scene->mNumMeshes; ++mi) {
         const aiMesh* mesh = scene->mMeshes[mi];
         for (unsigned b = 0; mesh && b < mesh->mNumBones; ++b) {
-            const aiNode* node = scene->mRootNode->FindNode(mesh->mBones[b]->mName);
+            const aiNode* node = findNode(mesh->mBones[b]->mName);
             for (; node && node != scene->mRootNode && !boneNodes.contains(node);
                  node = parentOf.value(node))
                 boneNodes.insert(node);
@@ -423,7 +438,7 @@ bool RkImporter::Private::convert(const aiScene* scene)
                 QVector<double> sums(n, 0.0);
                 for (unsigned b = 0; b < src->mNumBones; ++b) {
                     const aiBone* bone = src->mBones[b];
-                    const aiNode* boneNode = scene->mRootNode->FindNode(bone->mName);
+                    const aiNode* boneNode = findNode(bone->mName);
                     if (!boneNode || !boneIndex.contains(boneNode))
                         continue;
                     const Affine bind = world.value(boneNode) * Affine::from(bone->mOffsetMatrix);
@@ -776,6 +791,40 @@ void RkImporter::Private::buildObject(RkNode* node)
     node->setObject(object);
 }
 
+namespace
+{
+// The import library's glTF reader (5.2) crashes on a skin without inverse bind matrices, which
+// glTF allows; such files are refused before it sees them.
+bool hasSkinWithoutBindMatrices(const QString& path)
+{
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return false;
+    QByteArray json;
+    if (file.peek(4) == "glTF") {
+        // Binary: a 12-byte header, then chunks (length, type, data), the JSON chunk first.
+        if (!file.seek(12))
+            return false;
+        const QByteArray chunk = file.read(8);
+        if (chunk.size() < 8 || qFromLittleEndian<quint32>(chunk.constData() + 4) != 0x4E4F534Au)
+            return false;
+        const quint32 length = qFromLittleEndian<quint32>(chunk.constData());
+        if (length > quint64(file.size()))
+            return false;
+        json = file.read(length);
+    } else {
+        json = file.readAll();
+    }
+    const QJsonArray skins = QJsonDocument::fromJson(json).object().value("skins").toArray();
+    for (const QJsonValue& skin : skins) {
+        if (!skin.toObject().contains(QLatin1String("inverseBindMatrices")))
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
 RkImporter::RkImporter() : d(std::make_unique<Private>()) {}
 
 RkImporter::~RkImporter() = default;
@@ -794,6 +843,14 @@ bool RkImporter::read(const QString& path)
         return d->fail(QStringLiteral("\"%1\" does not exist").arg(path));
     if (!info.isFile() || !info.isReadable())
         return d->fail(QStringLiteral("\"%1\" cannot be read").arg(path));
+
+    const QString suffix = info.suffix().toLower();
+    if ((suffix == QLatin1String("gltf") || suffix == QLatin1String("glb")) &&
+        hasSkinWithoutBindMatrices(d->path)) {
+        return d->fail(QStringLiteral("\"%1\" was refused: one of its skins has no inverse bind "
+                                      "matrices, which this version cannot read")
+                           .arg(shown));
+    }
 
     Assimp::Importer importer;
     importer.SetPropertyInteger(AI_CONFIG_PP_LBW_MAX_WEIGHTS, RkMeshDeformer::MaxInfluences);

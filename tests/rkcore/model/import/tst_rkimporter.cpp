@@ -79,6 +79,70 @@ bool sameVertices(const QVector<RkVec3>& a, const QVector<RkVec3>& b)
     return true;
 }
 
+// A glTF file whose one triangle list is skinned to `joints` joints, four per vertex, each with
+// some weight, so that every joint becomes a bone; with or without inverse bind matrices.
+QByteArray skinnedGltf(int joints, bool bindMatrices = true)
+{
+    const int vertices = ((joints + 3) / 4 + 2) / 3 * 3;
+    QByteArray positions, jointIds, weights;
+    for (int v = 0; v < vertices; ++v) {
+        const float p[3] = {float(v), float(v % 3), 0.0f};
+        positions.append(reinterpret_cast<const char*>(p), sizeof p);
+        for (int k = 0; k < 4; ++k) {
+            const quint16 joint = quint16(qMin(v * 4 + k, joints - 1));
+            jointIds.append(reinterpret_cast<const char*>(&joint), sizeof joint);
+            const float w = 0.25f;
+            weights.append(reinterpret_cast<const char*>(&w), sizeof w);
+        }
+    }
+    QByteArray matrices;
+    for (int j = 0; bindMatrices && j < joints; ++j) {
+        for (int k = 0; k < 16; ++k) {
+            const float m = k % 5 == 0 ? 1.0f : 0.0f;
+            matrices.append(reinterpret_cast<const char*>(&m), sizeof m);
+        }
+    }
+    const QByteArray buffer = positions + jointIds + weights + matrices;
+    QString nodes = QStringLiteral("{\"mesh\":0,\"skin\":0}");
+    QString jointList, sceneNodes = QStringLiteral("0");
+    for (int j = 1; j <= joints; ++j) {
+        nodes += QStringLiteral(",{\"name\":\"j%1\"}").arg(j);
+        jointList += (j > 1 ? QStringLiteral(",") : QString()) + QString::number(j);
+        sceneNodes += QStringLiteral(",%1").arg(j);
+    }
+    const QString json =
+        QStringLiteral(
+            "{\"asset\":{\"version\":\"2.0\"},\"scene\":0,\"scenes\":[{\"nodes\":[%1]}],"
+            "\"nodes\":[%2],\"skins\":[{\"joints\":[%3]%12}],"
+            "\"meshes\":[{\"primitives\":[{\"attributes\":{\"POSITION\":0,\"JOINTS_0\":1,"
+            "\"WEIGHTS_0\":2}}]}],"
+            "\"accessors\":[{\"bufferView\":0,\"componentType\":5126,\"count\":%4,"
+            "\"type\":\"VEC3\",\"min\":[0,0,0],\"max\":[%5,2,0]},"
+            "{\"bufferView\":1,\"componentType\":5123,\"count\":%4,\"type\":\"VEC4\"},"
+            "{\"bufferView\":2,\"componentType\":5126,\"count\":%4,\"type\":\"VEC4\"},"
+            "{\"bufferView\":3,\"componentType\":5126,\"count\":%13,\"type\":\"MAT4\"}],"
+            "\"bufferViews\":[{\"buffer\":0,\"byteOffset\":0,\"byteLength\":%6},"
+            "{\"buffer\":0,\"byteOffset\":%6,\"byteLength\":%7},"
+            "{\"buffer\":0,\"byteOffset\":%8,\"byteLength\":%9},"
+            "{\"buffer\":0,\"byteOffset\":%14,\"byteLength\":%15}],"
+            "\"buffers\":[{\"byteLength\":%10,"
+            "\"uri\":\"data:application/octet-stream;base64,%11\"}]}")
+            .arg(sceneNodes, nodes, jointList)
+            .arg(vertices)
+            .arg(vertices - 1)
+            .arg(positions.size())
+            .arg(jointIds.size())
+            .arg(positions.size() + jointIds.size())
+            .arg(weights.size())
+            .arg(buffer.size())
+            .arg(QString::fromLatin1(buffer.toBase64()))
+            .arg(bindMatrices ? QStringLiteral(",\"inverseBindMatrices\":3") : QString())
+            .arg(joints)
+            .arg(positions.size() + jointIds.size() + weights.size())
+            .arg(qMax(matrices.size(), 64));
+    return json.toUtf8();
+}
+
 } // namespace
 
 class TestRkImporter : public QObject
@@ -346,6 +410,10 @@ void TestRkImporter::badFiles_data()
     QTest::newRow("NaN position") << QByteArray(
                                          "v 0 0 0\nv 1 0 0\nv 0 1 0\nv nan 0 0\nf 1 2 3\nf 1 3 4\n")
                                   << "obj" << false << "vertices without a valid position";
+    // glTF allows a skin without bind matrices, but the reader crashes on it.
+    QTest::newRow("skinned to 12 joints") << skinnedGltf(12) << "gltf" << false << QString();
+    QTest::newRow("skin without bind matrices")
+        << skinnedGltf(12, false) << "gltf" << true << "no inverse bind matrices";
     QTest::newRow("polygon") << QByteArray("v 0 0 0\nv 1 0 0\nv 1 1 0\nv 0.5 1.5 0\nv 0 1 0\n"
                                            "f 1 2 3 4 5\n")
                              << "obj" << false << QString();
