@@ -7,6 +7,7 @@
 #include <QHBoxLayout>
 #include <QMouseEvent>
 #include <QPointer>
+#include <QSignalBlocker>
 #include <QStyle>
 
 struct RkBasicPropertyWgt::Private {
@@ -56,6 +57,18 @@ void RkBasicPropertyWgt::removeAllProperties()
 bool RkBasicPropertyWgt::doOptionsDialog()
 {
     return false;
+}
+
+void RkBasicPropertyWgt::updateFromProperties()
+{
+    if (d->slider) {
+        const RkProperty* first = getFirstProperty();
+        const QSignalBlocker blocker(d->slider);
+        d->slider->setLabel(first ? first->getLabel() : QString());
+        d->slider->setMixed(first && arePropertiesMixed());
+        d->slider->setEnabled(first && arePropertiesEditable());
+    }
+    RkPropertyWgt::updateFromProperties();
 }
 
 void RkBasicPropertyWgt::mouseDoubleClickEvent(QMouseEvent* event)

@@ -24,6 +24,9 @@ public:
     virtual bool doOptionsDialog();
 
 protected:
+    // Gives the attached slider the first property's label and the group's mixed and editable
+    // state; the typed widgets set limits and value before calling it.
+    void updateFromProperties() override;
     void mouseDoubleClickEvent(QMouseEvent* event) override;
     void enterEvent(QEvent* event) override;
     void leaveEvent(QEvent* event) override;

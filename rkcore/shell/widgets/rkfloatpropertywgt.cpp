@@ -153,24 +153,15 @@ bool RkFloatPropertyWgt::isMouseOverSlider() const
 
 void RkFloatPropertyWgt::updateFromProperties()
 {
-    const auto* first = static_cast<const RkFloatProperty*>(getFirstProperty());
-    const QSignalBlocker blocker(d->slider);
-    if (!first) {
-        d->slider->setLabel(QString());
-        d->slider->setMixed(false);
-        d->slider->setEnabled(false);
-        RkBasicPropertyWgt::updateFromProperties();
-        return;
+    if (const auto* first = static_cast<const RkFloatProperty*>(getFirstProperty())) {
+        const QSignalBlocker blocker(d->slider);
+        d->slider->setClamped(first->isClamped());
+        d->slider->setMinMax(first->getMin(), first->getMax());
+        d->slider->setSensitivity(first->getSensitivity());
+        d->slider->setDefaultValue(first->getDefaultValue());
+        d->slider->setDisplayAsPercent(first->getDisplayAsPercent());
+        d->slider->setValue(first->getValue());
     }
-    d->slider->setLabel(first->getLabel());
-    d->slider->setClamped(first->isClamped());
-    d->slider->setMinMax(first->getMin(), first->getMax());
-    d->slider->setSensitivity(first->getSensitivity());
-    d->slider->setDefaultValue(first->getDefaultValue());
-    d->slider->setDisplayAsPercent(first->getDisplayAsPercent());
-    d->slider->setValue(first->getValue());
-    d->slider->setMixed(arePropertiesMixed());
-    d->slider->setEnabled(arePropertiesEditable());
     RkBasicPropertyWgt::updateFromProperties();
 }
 

@@ -39,22 +39,13 @@ bool RkIntPropertyWgt::isMouseOverSlider() const
 
 void RkIntPropertyWgt::updateFromProperties()
 {
-    const auto* first = static_cast<const RkIntProperty*>(getFirstProperty());
-    const QSignalBlocker blocker(d->slider);
-    if (!first) {
-        d->slider->setLabel(QString());
-        d->slider->setMixed(false);
-        d->slider->setEnabled(false);
-        RkBasicPropertyWgt::updateFromProperties();
-        return;
+    if (const auto* first = static_cast<const RkIntProperty*>(getFirstProperty())) {
+        const QSignalBlocker blocker(d->slider);
+        d->slider->setClamped(first->isClamped());
+        d->slider->setMinMax(first->getMin(), first->getMax());
+        d->slider->setDefaultValue(first->getDefaultValue());
+        d->slider->setValue(first->getValue());
     }
-    d->slider->setLabel(first->getLabel());
-    d->slider->setClamped(first->isClamped());
-    d->slider->setMinMax(first->getMin(), first->getMax());
-    d->slider->setDefaultValue(first->getDefaultValue());
-    d->slider->setValue(first->getValue());
-    d->slider->setMixed(arePropertiesMixed());
-    d->slider->setEnabled(arePropertiesEditable());
     RkBasicPropertyWgt::updateFromProperties();
 }
 
